@@ -1,0 +1,84 @@
+#include "alias/editalias.h"
+
+#include "alias/aliasfield.h"
+#include "alias/editaliasentry.h"
+#include "widgets/fieldtext.h"
+#include "widgets/listgroup.h"
+#include "widgets/recordrows.h"
+
+#include <QVBoxLayout>
+
+namespace {
+
+std::string_view shown(const alias_list_entry &target) {
+    return target.alias;
+}
+
+alias_list_entry copyOf(const alias_list_entry &target) {
+    return {target.alias, target.type, target.bang};
+}
+
+} // namespace
+
+EditAlias::EditAlias(QWidget *parent, const char *name, const alias_entry *alias)
+    : FormDialog(parent, name, "Email Address Aliasing") {
+    address_ =
+        addField("&Address:", {70, 18}, alias != nullptr ? std::string_view{alias->address} : "");
+    applyRule(address_, oneWordRule());
+
+    auto *group = new ListGroup("Aliases", {250, 70}, this);
+    box_ = group->box();
+    group->addEditButtons(this, &EditAlias::Add, &EditAlias::Modify, &EditAlias::Remove,
+                          &EditAlias::Selected);
+    group->column()->addStretch(100);
+    rows()->addWidget(group);
+    if (alias != nullptr) {
+        targets_ = alias->aliases.copied(copyOf);
+        appendRows(box_, targets_, shown);
+    }
+    fixSize({350, 210}, {348, 180});
+    addButtonRow();
+}
+
+std::string EditAlias::address() const {
+    return fieldBytes(address_);
+}
+
+RecordChain<alias_list_entry> EditAlias::takeTargets() {
+    return std::move(targets_);
+}
+
+void EditAlias::Add() {
+    EditAliasEntry dialog{this, "Edit", nullptr};
+    if (dialog.exec() == QDialog::Accepted) {
+        alias_list_entry target;
+        Read(&target, &dialog);
+        addShown(box_, &targets_.head, std::move(target), shown);
+    }
+}
+
+void EditAlias::Remove() {
+    removeCurrent(box_, &targets_.head, shown);
+}
+
+void EditAlias::Selected(const char *text) {
+    alias_list_entry **link = linkToShown(&targets_.head, text, shown);
+    if (link == nullptr) {
+        return;
+    }
+    EditAliasEntry dialog{this, "edit", *link};
+    if (dialog.exec() == QDialog::Accepted) {
+        Read(*link, &dialog);
+        changeCurrentRow(box_, (*link)->alias);
+    }
+}
+
+void EditAlias::Modify() {
+    Selected(currentText(box_));
+}
+
+void EditAlias::Read(alias_list_entry *target, EditAliasEntry *dialog) {
+    if (target != nullptr && dialog != nullptr) {
+        dialog->store(*target);
+    }
+}

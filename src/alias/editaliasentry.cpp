@@ -1,0 +1,79 @@
+#include "alias/editaliasentry.h"
+
+#include "alias/aliasfield.h"
+#include "alias/aliasfile.h"
+#include "widgets/fieldtext.h"
+
+#include <QComboBox>
+#include <QFileDialog>
+#include <QHBoxLayout>
+#include <QLabel>
+#include <QLineEdit>
+#include <QPushButton>
+
+#include <array>
+#include <optional>
+
+namespace {
+
+struct TypeEntry {
+    const char *caption;
+    std::optional<std::uint8_t> type; ///< None: the file has no mark for it.
+};
+
+constexpr std::array<TypeEntry, 5> typeEntries{{{"Address", ALIAS_ADDRESS},
+                                                {"Mailing List Posting", ALIAS_LIST_POSTING},
+                                                {"Mailing List Admin", ALIAS_LIST_ADMIN},
+                                                {"Auto Responder", std::nullopt},
+                                                {"External Task", std::nullopt}}};
+
+/// "Address" stands for every type that has no entry of its own.
+int entryShownFor(std::uint8_t type) {
+    for (std::size_t index = 0; index < typeEntries.size(); ++index) {
+        if (typeEntries.at(index).type == type) {
+            return static_cast<int>(index);
+        }
+    }
+    return 0;
+}
+
+} // namespace
+
+EditAliasEntry::EditAliasEntry(QWidget *parent, const char *name, const alias_list_entry *target)
+    : FormDialog(parent, name, "Address Alias"), type_{new QComboBox} {
+    QHBoxLayout *aliasRow = addRow();
+    alias_ = addField(aliasRow, "&Alias:", {40, 18},
+                      target != nullptr ? std::string_view{target->alias} : "");
+    applyRule(alias_, oneWordRule());
+    connect(addBrowseButton(aliasRow, 70, this), &QPushButton::clicked, this,
+            &EditAliasEntry::browse);
+
+    type_->setObjectName("Alias Type");
+    type_->setFixedHeight(fieldHeight);
+    for (const TypeEntry &entry : typeEntries) {
+        type_->addItem(QString::fromUtf8(entry.caption));
+    }
+    type_->setCurrentIndex(target != nullptr ? entryShownFor(target->type) : 0);
+    QLabel *label = newLabel(QStringLiteral("Alias Type:"), {70, fieldHeight}, this);
+    label->setBuddy(type_);
+    QHBoxLayout *typeRow = addRow();
+    typeRow->addWidget(label);
+    typeRow->addWidget(type_);
+    typeRow->addStretch();
+
+    fixSize({350, 100}, {348, 80});
+    addButtonRow();
+}
+
+void EditAliasEntry::store(alias_list_entry &target) const {
+    target.alias = fieldBytes(alias_);
+    const auto &entry = typeEntries.at(static_cast<std::size_t>(type_->currentIndex()));
+    target.type = entry.type.value_or(target.type);
+}
+
+void EditAliasEntry::browse() {
+    const QString directory = QFileDialog::getExistingDirectory(this, {}, alias_->text());
+    if (!directory.isEmpty()) {
+        replaceByRule(alias_, directory);
+    }
+}

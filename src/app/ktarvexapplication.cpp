@@ -1,0 +1,83 @@
+#include "app/ktarvexapplication.h"
+
+#include "alias/aliasfile.h"
+#include "alias/mailalias.h"
+#include "config/masterfile.h"
+#include "config/productpaths.h"
+#include "config/settings.h"
+#include "fetch/mailfetch.h"
+#include "fetch/pophosts.h"
+#include "lists/maillist.h"
+#include "lists/maillistfile.h"
+#include "server/maildebatch.h"
+#include "server/mailimap.h"
+#include "server/mailpop3.h"
+#include "server/mailsmtp.h"
+#include "server/smtprejectfile.h"
+
+#include <cstdlib>
+
+namespace {
+
+void readFiles() {
+    readMasterConfig();
+    readAliasFile();
+    readSmtpRejectFile();
+    readMailListFile();
+    parsePopHosts(settings().pop_hosts.value);
+}
+
+void writeFiles() {
+    writeAliasFile();
+    writeSmtpRejectFile();
+    writeMailListFile();
+    writeMasterConfig();
+}
+
+void reconfigureServices() {
+    // What the command reports is its own business; the files are written whatever it says.
+    [[maybe_unused]] const int status = std::system(productPaths().reconfigureCommand);
+}
+
+} // namespace
+
+KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
+    : KControlApplication{
+          argc,
+          argv,
+          name,
+          {"smtpserver", "pop3server", "imapserver", "fetch", "debatch", "alias", "list"}} {
+    readFiles();
+    if (isInitOnly()) {
+        return;
+    }
+    createPage(smtp_, "smtpserver", "&SMTP", "tarvex-mail-smtp.html");
+    createPage(pop3_, "pop3server", "&POP3", "tarvex-mail-pop3.html");
+    createPage(imap_, "imapserver", "&IMAP", "tarvex-mail-imap.html");
+    createPage(fetch_, "fetch", "Fetchers", "tarvex-mail-fetchers.html");
+    createPage(delivery_, "debatch", "&Delivery", "tarvex-mail-delivery.html");
+    createPage(alias_, "alias", "&Aliasing", "tarvex-mail-alias.html");
+    createPage(lists_, "list", "&Mail List", "tarvex-mail-list.html");
+    showDialog();
+}
+
+void KTarvexApplication::applyChanges() {
+    // Delivery stores before the fetchers, unlike the order of the tabs.
+    for (KConfigWidget *page : std::initializer_list<KConfigWidget *>{
+             smtp_, pop3_, imap_, delivery_, fetch_, alias_, lists_}) {
+        if (page != nullptr) {
+            page->storeValues();
+        }
+    }
+    writeFiles();
+    reconfigureServices();
+}
+
+template <class Page>
+void KTarvexApplication::createPage(Page *&page, const char *name, const char *label,
+                                    const char *helpFile) {
+    if (isPageRequested(name)) {
+        page = new Page(dialog(), name);
+        addPage(page, label, helpFile);
+    }
+}

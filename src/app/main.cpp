@@ -1,0 +1,7 @@
+#include "app/ktarvexapplication.h"
+
+int main(int argc, char **argv) {
+    KTarvexApplication application{argc, argv, "kcmtarvex_mail"};
+    application.setTitle(KApplication::getLocale()->translate("Tarvex Mail Config"));
+    return application.isInitOnly() ? 0 : application.exec();
+}

@@ -1,0 +1,120 @@
+#pragma once
+
+#include <utility>
+
+/// Singly linked records, reached through a head pointer: the only code that makes, links, unlinks
+/// or frees a record. A record is an aggregate with a `next` member; a list walks by link (the
+/// pointer that points to the record), so that the first record is no special case.
+
+/// Puts a new record before the one that `*head` points to and gives it back. The list owns it.
+template <class Record>
+Record &prependRecord(Record **head, Record value) {
+    auto *record = new Record{std::move(value)};
+    record->next = *head;
+    *head = record;
+    return *record;
+}
+
+/// Adds records at the end of a list, each in constant time. The list must not lose its last
+/// record while this lives.
+template <class Record>
+class RecordAppender {
+public:
+    explicit RecordAppender(Record **head) : end_{head} {
+        while (*end_ != nullptr) {
+            end_ = &(*end_)->next;
+        }
+    }
+
+    Record &append(Record value) {
+        Record &record = prependRecord(end_, std::move(value));
+        end_ = &record.next;
+        return record;
+    }
+
+private:
+    Record **end_;
+};
+
+/// The link to the first record, from the head, for which `matches(record)` holds; the list's last
+/// link, which points to nothing, when there is none.
+template <class Record, class Matches>
+Record **findRecord(Record **head, Matches matches) {
+    while (*head != nullptr && !matches(**head)) {
+        head = &(*head)->next;
+    }
+    return head;
+}
+
+/// Unlinks the record that `*link` points to and frees it.
+template <class Record>
+void removeRecord(Record **link) {
+    Record *record = *link;
+    *link = record->next;
+    delete record;
+}
+
+/// Owns a list of records through its head and frees them in a loop: recursion would overflow the
+/// stack on a long list.
+template <class Record>
+struct RecordChain {
+    Record *head = nullptr;
+
+    RecordChain() = default;
+    RecordChain(RecordChain &&other) noexcept : head{std::exchange(other.head, nullptr)} {}
+    RecordChain &operator=(RecordChain &&other) noexcept {
+        std::swap(head, other.head);
+        return *this;
+    }
+    RecordChain(const RecordChain &) = delete;
+    RecordChain &operator=(const RecordChain &) = delete;
+    ~RecordChain() { clear(); }
+
+    void clear() {
+        while (head != nullptr) {
+            removeRecord(&head);
+        }
+    }
+
+    /// The records in the same order, each the result of `copyOf(record)`.
+    template <class CopyOf>
+    [[nodiscard]] RecordChain copied(CopyOf copyOf) const {
+        RecordChain copies;
+        RecordAppender<Record> end{&copies.head};
+        for (const Record &record : *this) {
+            end.append(copyOf(record));
+        }
+        return copies;
+    }
+
+    template <class Each>
+    class Iterator {
+    public:
+        explicit Iterator(Each *record) : record_{record} {}
+        Each &operator*() const { return *record_; }
+        Iterator &operator++() {
+            record_ = record_->next;
+            return *this;
+        }
+        bool operator!=(const Iterator &other) const { return record_ != other.record_; }
+
+    private:
+        Each *record_;
+    };
+
+    Iterator<Record> begin() { return Iterator<Record>{head}; }
+    Iterator<Record> end() { return Iterator<Record>{nullptr}; }
+    Iterator<const Record> begin() const { return Iterator<const Record>{head}; }
+    Iterator<const Record> end() const { return Iterator<const Record>{nullptr}; }
+};
+
+/// Puts the records of `front` before those of the list.
+template <class Record>
+void prependChain(Record **head, RecordChain<Record> front) {
+    Record **end = &front.head;
+    while (*end != nullptr) {
+        end = &(*end)->next;
+    }
+    *end = *head;
+    *head = std::exchange(front.head, nullptr);
+}

@@ -1,0 +1,54 @@
+#include "fetch/editfetch.h"
+
+#include "fetch/pophosts.h"
+#include "widgets/fieldrule.h"
+#include "widgets/fieldtext.h"
+
+#include <QLineEdit>
+
+namespace {
+
+constexpr QSize labelSize{70, 18};
+
+/// A field for an array of `size` bytes.
+FieldRule ruleFor(std::size_t size) {
+    const int mostBytes = static_cast<int>(size) - 1;
+    return {QStringLiteral(":@,"),
+            {},
+            mostBytes,
+            QStringLiteral("At most %1 bytes, without \":\", \"@\" and \",\"").arg(mostBytes)};
+}
+
+} // namespace
+
+EditFetch::EditFetch(QWidget *parent, const char *name, const pop_host *host)
+    : FormDialog(parent, name, "POP Fetcher Settings") {
+    const pop_host shown = host != nullptr ? *host : pop_host{};
+    server_ = addField("&Server:", labelSize, popHostText(shown.server));
+    user_ = addField("&Username:", labelSize, popHostText(shown.user));
+    password_ = addField("&Password:", labelSize, popHostText(shown.password));
+    fixSize({250, 140}, {247, 110});
+    addButtonRow();
+
+    applyRule(server_, ruleFor(shown.server.size()));
+    applyRule(password_, ruleFor(shown.password.size()));
+    FieldRule userRule = ruleFor(shown.user.size());
+    // A new entry stands without a prefix at the beginning of a line, where these have a meaning of
+    // their own or, like white space, are dropped.
+    userRule.refusedFirst = QStringLiteral("-*%| \t\r\n");
+    userRule.toolTip +=
+        QStringLiteral("; not beginning with \"-\", \"*\", \"%\", \"|\" or a blank");
+    applyRule(user_, userRule);
+}
+
+std::string EditFetch::server() const {
+    return fieldBytes(server_);
+}
+
+std::string EditFetch::user() const {
+    return fieldBytes(user_);
+}
+
+std::string EditFetch::password() const {
+    return fieldBytes(password_);
+}

@@ -1,0 +1,25 @@
+#pragma once
+
+#include "widgets/formdialog.h"
+
+#include <string>
+
+struct pop_host;
+
+/// Asks for one fetcher. The fields take only what the fetcher list can carry.
+class EditFetch : public FormDialog {
+    Q_OBJECT
+
+public:
+    /// `host` is what the fields start with; null for empty fields.
+    EditFetch(QWidget *parent, const char *name, const pop_host *host);
+
+    [[nodiscard]] std::string server() const;
+    [[nodiscard]] std::string user() const;
+    [[nodiscard]] std::string password() const;
+
+private:
+    QLineEdit *server_;
+    QLineEdit *user_;
+    QLineEdit *password_;
+};

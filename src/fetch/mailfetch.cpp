@@ -1,0 +1,89 @@
+#include "fetch/mailfetch.h"
+
+#include "config/settings.h"
+#include "fetch/editfetch.h"
+#include "fetch/pophosts.h"
+#include "platform/knumericspinbox.h"
+#include "widgets/listgroup.h"
+#include "widgets/pagelayout.h"
+#include "widgets/recordrows.h"
+
+#include <QLabel>
+
+namespace {
+
+constexpr int columnWidth = 80;
+constexpr int spaceAbovePollTime = 40;
+
+std::string_view shown(const pop_host &host) {
+    return popHostText(host.user);
+}
+
+} // namespace
+
+MailFetch::MailFetch(QWidget *parent, const char *name)
+    : KConfigWidget(parent, name), pollTime_{new KNumericSpinBox} {
+    auto *group = new ListGroup("POP3 Mail Fetchers", {600, columnWidth}, this);
+    fetchers_ = group->box();
+    appendRows(fetchers_, pop_host_list, shown);
+    group->addEditButtons(this, &MailFetch::MailFetchAdd, &MailFetch::MailFetchModify,
+                          &MailFetch::MailFetchRemove, &MailFetch::MailFetchSelected);
+
+    pollTime_->setRange(0, 999);
+    pollTime_->setStep(1);
+    pollTime_->setEditable(true);
+    pollTime_->setValue(settings().pop_time.value);
+    auto *label = new QLabel(QStringLiteral("Poll time (s):"));
+    label->setBuddy(pollTime_);
+    QVBoxLayout *column = group->column();
+    column->addSpacing(spaceAbovePollTime);
+    column->addWidget(label);
+    column->addWidget(pollTime_);
+    column->addStretch();
+    group->fixColumnWidth(columnWidth);
+    newPageLayout(this)->addWidget(group);
+}
+
+void MailFetch::loadValues() {}
+
+void MailFetch::storeValues() {
+    settings().pop_time.value = pollTime_->getValue();
+    textSetting(settings().pop_hosts.value, formatPopHosts());
+}
+
+void MailFetch::MailFetchAdd() {
+    EditFetch dialog{this, "Edit", nullptr};
+    if (dialog.exec() == QDialog::Accepted) {
+        pop_host host;
+        MailFetchRead(&host, &dialog);
+        addShown(fetchers_, &pop_host_list.head, host, shown);
+    }
+}
+
+void MailFetch::MailFetchRemove() {
+    removeCurrent(fetchers_, &pop_host_list.head, shown);
+}
+
+void MailFetch::MailFetchSelected(const char *user) {
+    pop_host **link = linkToShown(&pop_host_list.head, user, shown);
+    if (link == nullptr) {
+        return;
+    }
+    EditFetch dialog{this, "edit", *link};
+    if (dialog.exec() == QDialog::Accepted) {
+        MailFetchRead(*link, &dialog);
+        changeCurrentRow(fetchers_, shown(**link));
+    }
+}
+
+void MailFetch::MailFetchModify() {
+    MailFetchSelected(currentText(fetchers_));
+}
+
+void MailFetch::MailFetchRead(pop_host *host, EditFetch *dialog) {
+    if (host != nullptr && dialog != nullptr) {
+        setPopHostText(host->server, dialog->server());
+        setPopHostText(host->user, dialog->user());
+        setPopHostText(host->password, dialog->password());
+    }
+}

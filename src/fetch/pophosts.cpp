@@ -1,0 +1,85 @@
+#include "fetch/pophosts.h"
+
+#include <algorithm>
+#include <new>
+
+RecordChain<pop_host> pop_host_list;
+
+namespace {
+
+constexpr std::string_view separators = ":@,\r\n";
+constexpr std::string_view betweenEntries = ",\r\n";
+
+std::uint32_t takeFlags(std::string_view &text) {
+    std::uint32_t flags = POP_HOST_STAR;
+    for (; text.starts_with('-') || text.starts_with('*'); text.remove_prefix(1)) {
+        flags |= text.front() == '-' ? POP_HOST_MINUS : POP_HOST_STAR;
+    }
+    return flags;
+}
+
+template <std::size_t size>
+void takeField(std::string_view &text, std::array<char, size> &field) {
+    const std::string_view room = text.substr(0, size - 1);
+    const std::string_view taken = room.substr(0, room.find_first_of(separators));
+    setPopHostText(field, taken);
+    text.remove_prefix(taken.size());
+}
+
+/// Steps past the character at which a field ended; whether it is the one that should stand there.
+bool takeSeparator(std::string_view &text, char expected) {
+    const bool matches = text.starts_with(expected);
+    text.remove_prefix(std::min<std::size_t>(text.size(), 1));
+    return matches;
+}
+
+/// Takes one entry, or as much of it as shows that it is none.
+bool takeEntry(std::string_view &text, pop_host &host) {
+    host.flags = takeFlags(text);
+    takeField(text, host.user);
+    if (!takeSeparator(text, ':')) {
+        return false;
+    }
+    takeField(text, host.password);
+    if (!takeSeparator(text, '@')) {
+        return false;
+    }
+    takeField(text, host.server);
+    return true;
+}
+
+} // namespace
+
+void parsePopHosts(TextOrNone text) {
+    pop_host_list.clear();
+    std::string_view rest = text.value_or(std::string_view{});
+    RecordAppender<pop_host> end{&pop_host_list.head};
+    try {
+        for (;;) {
+            rest.remove_prefix(std::min(rest.find_first_not_of(betweenEntries), rest.size()));
+            if (rest.empty()) {
+                return;
+            }
+            pop_host host;
+            if (takeEntry(rest, host)) {
+                end.append(host);
+            }
+        }
+    } catch (const std::bad_alloc &) { // The records made so far stay.
+    }
+}
+
+std::string formatPopHosts() {
+    std::string text;
+    for (const pop_host &host : pop_host_list) {
+        text += (host.flags & POP_HOST_MINUS) != 0 ? "-" : "";
+        text += (host.flags & POP_HOST_STAR) != 0 ? "*" : "";
+        text += popHostText(host.user);
+        text += ':';
+        text += popHostText(host.password);
+        text += '@';
+        text += popHostText(host.server);
+        text += '\n';
+    }
+    return text;
+}

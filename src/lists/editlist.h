@@ -1,0 +1,111 @@
+#pragma once
+
+#include "lists/maillistfile.h"
+#include "widgets/formdialog.h"
+
+#include <vector>
+
+class EditListAddr;
+class KNumericSpinBox;
+class ListGroup;
+class QBoxLayout;
+class QCheckBox;
+class QGroupBox;
+class QListBox;
+
+/// Edits one mailing list. Everything, the three address lists included, is a copy: the record
+/// changes only when `store` is called, after the dialog was accepted.
+class EditList : public FormDialog {
+    Q_OBJECT
+
+public:
+    /// `list` is what the dialog starts with; null for a new list.
+    EditList(QWidget *parent, const char *name, const maillist_entry *list);
+
+    /// Hands everything over to the record, the address lists by giving them away; what the editor
+    /// does not edit stays as it is.
+    void store(maillist_entry &list);
+
+public slots:
+    void MemberAdd();
+    void MemberRemove();
+    void MemberSelected(const char *text);
+    void MemberModify();
+    void MemberSearch();
+    void MemberLoad();
+    void AllowAdd();
+    void AllowRemove();
+    void AllowSelected(const char *text);
+    void AllowModify();
+    void AllowSearch();
+    void AllowLoad();
+    void BlockAdd();
+    void BlockRemove();
+    void BlockSelected(const char *text);
+    void BlockModify();
+    void BlockSearch();
+    void BlockLoad();
+    void Add(QListBox *box, maillist_addr_entry **chain);
+    void AddMember(QListBox *box, maillist_addr_entry **chain);
+    void Remove(QListBox *box, maillist_addr_entry **chain);
+    void Selected(QListBox *box, maillist_addr_entry **chain, const char *text);
+    void SelectedMember(QListBox *box, maillist_addr_entry **chain, const char *text);
+    void Search(QListBox *box, maillist_addr_entry **chain);
+    void Load(QListBox *box, maillist_addr_entry **chain);
+    void Read(maillist_addr_entry *entry, EditListAddr *dialog);
+    void browseInfo();
+    void browseHeader();
+    void browseFooter();
+
+private:
+    /// One address list: the working copy and the box that shows it.
+    struct Addresses {
+        AddressChain maillist_entry::*field;
+        AddressChain chain;
+        ListGroup *group = nullptr;
+        QListBox *box = nullptr;
+    };
+    struct TextField {
+        QLineEdit *edit;
+        std::string maillist_entry::*field;
+    };
+    struct OptionBox {
+        QCheckBox *box;
+        std::uint32_t bit;
+    };
+    struct NumberField {
+        KNumericSpinBox *box;
+        std::int32_t maillist_entry::*field;
+    };
+
+    /// What stands behind a number, in a label of that width in pixels.
+    struct Unit {
+        const char *caption;
+        int width;
+    };
+
+    QGroupBox *newAddressFields(const maillist_entry &list);
+    QHBoxLayout *addTextField(QBoxLayout *rows, const char *caption, QSize label,
+                              std::string maillist_entry::*field, const maillist_entry &list);
+    QLineEdit *addFileField(QBoxLayout *rows, const char *caption,
+                            std::string maillist_entry::*field, const maillist_entry &list,
+                            void (EditList::*browse)());
+    QGroupBox *newOptions(const maillist_entry &list);
+    void addTrigger(QBoxLayout *rows, const char *caption, const Unit &unit,
+                    std::int32_t maillist_entry::*field, const maillist_entry &list);
+    ListGroup *newAddressGroup(const char *caption, Addresses &addresses,
+                               const maillist_entry &list);
+    void connectButtons();
+    void addSearchAndLoad(const Addresses &addresses, void (EditList::*search)(),
+                          void (EditList::*load)());
+
+    std::vector<TextField> texts_;
+    std::vector<OptionBox> options_;
+    std::vector<NumberField> triggers_;
+    QLineEdit *info_ = nullptr;
+    QLineEdit *header_ = nullptr;
+    QLineEdit *footer_ = nullptr;
+    Addresses members_{&maillist_entry::member, {}};
+    Addresses allowed_{&maillist_entry::allow, {}};
+    Addresses blocked_{&maillist_entry::block, {}};
+};

@@ -1,0 +1,17 @@
+#include "lists/editlistaddr.h"
+
+#include "lists/listdialog.h"
+#include "lists/maillistfile.h"
+#include "widgets/fieldtext.h"
+
+EditListAddr::EditListAddr(QWidget *parent, const char *name, const maillist_addr_entry *entry)
+    : FormDialog(parent, name, "Mail List Address"),
+      email_{addField("&Email:", listDialogLabel,
+                      entry != nullptr ? std::string_view{entry->addr} : "")} {
+    fixSize(listDialogSize, listDialogSize);
+    addButtonRow();
+}
+
+std::string EditListAddr::email() const {
+    return fieldBytes(email_);
+}

@@ -1,0 +1,26 @@
+#pragma once
+
+#include "widgets/formdialog.h"
+
+#include <string>
+
+class QCheckBox;
+struct maillist_addr_entry;
+
+/// Asks for one list member and whether the member is on the digest.
+class EditListMember : public FormDialog {
+    Q_OBJECT
+
+public:
+    /// `entry` is what the dialog starts with; null for an empty field and no digest.
+    EditListMember(QWidget *parent, const char *name, const maillist_addr_entry *entry);
+
+    /// As it was typed.
+    [[nodiscard]] std::string email() const;
+    /// As a record holds it: behind ":" for a member on the digest.
+    [[nodiscard]] std::string addr() const;
+
+private:
+    QLineEdit *email_;
+    QCheckBox *digest_;
+};

@@ -1,0 +1,15 @@
+#include "lists/listsearch.h"
+
+#include "lists/listdialog.h"
+#include "widgets/fieldtext.h"
+
+ListSearch::ListSearch(QWidget *parent, const char *name)
+    : FormDialog(parent, name, "Mail List Search"),
+      text_{addField("&Search for:", listDialogLabel, {})} {
+    fixSize(listDialogSize, listDialogSize);
+    addButtonRow();
+}
+
+std::string ListSearch::text() const {
+    return fieldBytes(text_);
+}

@@ -1,0 +1,192 @@
+#include "lists/maillistfile.h"
+
+#include "config/datafile.h"
+
+#include <array>
+
+RecordChain<maillist_entry> maillist_list;
+
+namespace {
+
+constexpr std::size_t longestPiece = 249;
+constexpr std::size_t longestLoadedPiece = 254;
+
+struct TextKey {
+    std::string_view key;
+    std::string maillist_entry::*field;
+};
+
+/// In the order of the written block. The info file stands twice: that is how the file is.
+constexpr std::array<TextKey, 9> textKeys{{{"%name:", &maillist_entry::name},
+                                           {"%post:", &maillist_entry::post},
+                                           {"%admin:", &maillist_entry::admin},
+                                           {"%support:", &maillist_entry::support},
+                                           {"%info:", &maillist_entry::info},
+                                           {"%footer:", &maillist_entry::footer},
+                                           {"%header:", &maillist_entry::header},
+                                           {"%modrt:", &maillist_entry::modrt},
+                                           {"%info:", &maillist_entry::info}}};
+
+struct NumberKey {
+    std::string_view key;
+    std::int32_t maillist_entry::*field;
+};
+
+constexpr std::array<NumberKey, 4> numberKeys{{{"%diglen:", &maillist_entry::diglen},
+                                               {"%digno:", &maillist_entry::digno},
+                                               {"%digcnt:", &maillist_entry::digcnt},
+                                               {"%digcur:", &maillist_entry::digcur}}};
+
+constexpr std::string_view flagsKey = "%flags:";
+
+struct Section {
+    std::string_view name; ///< Its first letter alone decides on reading.
+    AddressChain maillist_entry::*chain;
+};
+
+constexpr std::array<Section, 3> sections{{{"member", &maillist_entry::member},
+                                           {"allow", &maillist_entry::allow},
+                                           {"block", &maillist_entry::block}}};
+
+constexpr std::size_t sectionLetter = 7;
+
+AddressChain *sectionOpened(maillist_entry &list, std::string_view startLine) {
+    for (const Section &section : sections) {
+        if (startLine.size() > sectionLetter && startLine[sectionLetter] == section.name.front()) {
+            return &(list.*section.chain);
+        }
+    }
+    return nullptr;
+}
+
+void setField(maillist_entry &list, std::string_view line) {
+    for (const auto &[key, field] : textKeys) {
+        if (line.starts_with(key)) {
+            list.*field = line.substr(key.size());
+            return;
+        }
+    }
+    for (const auto &[key, field] : numberKeys) {
+        if (line.starts_with(key)) {
+            list.*field = parseInteger(line.substr(key.size()));
+            return;
+        }
+    }
+    if (line.starts_with(flagsKey)) {
+        list.flags = static_cast<std::uint32_t>(parseInteger(line.substr(flagsKey.size())));
+    }
+}
+
+/// Outside a list, inside a list, or inside one of its address sections.
+class BlockReader {
+public:
+    explicit BlockReader(RecordChain<maillist_entry> &lists) : lists_{lists} {}
+
+    void take(std::string_view piece) {
+        if (section_ != nullptr) {
+            takeAddress(piece);
+        } else if (list_ != nullptr) {
+            takeLine(lineText(piece));
+        } else if (piece.starts_with("#new")) {
+            list_ = &prependRecord(&lists_.head, maillist_entry{});
+        }
+    }
+
+private:
+    void takeAddress(std::string_view piece) {
+        if (piece.starts_with('#')) {
+            section_ = nullptr;
+        } else {
+            prependRecord(&section_->head, {std::string{lineText(piece)}});
+        }
+    }
+
+    void takeLine(std::string_view line) {
+        if (line.starts_with("#endlist")) {
+            list_ = nullptr;
+        } else if (line.starts_with("#start")) {
+            section_ = sectionOpened(*list_, line);
+            list_ = section_ != nullptr ? list_ : nullptr;
+        } else {
+            setField(*list_, line);
+        }
+    }
+
+    RecordChain<maillist_entry> &lists_;
+    maillist_entry *list_ = nullptr;
+    AddressChain *section_ = nullptr;
+};
+
+void appendLine(std::string &bytes, std::string_view key, std::string_view value) {
+    bytes += key;
+    bytes += value;
+    bytes += '\n';
+}
+
+void appendSection(std::string &bytes, std::string_view name, const AddressChain &addresses) {
+    appendLine(bytes, "#start ", name);
+    for (const maillist_addr_entry &address : addresses) {
+        if (!address.addr.starts_with('#')) {
+            appendLine(bytes, {}, address.addr);
+        }
+    }
+    appendLine(bytes, {}, "#end");
+}
+
+void appendList(std::string &bytes, const maillist_entry &list) {
+    appendLine(bytes, {}, "#new");
+    for (const auto &[key, field] : textKeys) {
+        appendLine(bytes, key, list.*field);
+    }
+    for (const auto &[key, field] : numberKeys) {
+        appendLine(bytes, key, formatSigned(list.*field));
+    }
+    appendLine(bytes, flagsKey, formatUnsigned(list.flags));
+    for (const auto &[name, chain] : sections) {
+        appendSection(bytes, name, list.*chain);
+    }
+    bytes += "#endlist\n\n\n";
+}
+
+} // namespace
+
+void parseMailLists(std::string_view bytes, RecordChain<maillist_entry> &lists) {
+    BlockReader reader{lists};
+    LinePieces pieces{bytes, longestPiece};
+    while (const std::optional<std::string_view> piece = pieces.next()) {
+        reader.take(*piece);
+    }
+}
+
+std::string formatMailLists(const RecordChain<maillist_entry> &lists) {
+    std::string bytes;
+    for (const maillist_entry &list : lists) {
+        appendList(bytes, list);
+    }
+    return bytes;
+}
+
+std::vector<std::string> parseAddressLines(std::string_view bytes) {
+    std::vector<std::string> addresses;
+    LinePieces pieces{bytes, longestLoadedPiece};
+    while (const std::optional<std::string_view> piece = pieces.next()) {
+        if (beforeNul(*piece).find('@') != std::string_view::npos) {
+            addresses.emplace_back(lineText(*piece));
+        }
+    }
+    return addresses;
+}
+
+void readMailListFile() {
+    maillist_list.clear();
+    try {
+        if (const auto bytes = readDataFile(settings().mail_file_maillist)) {
+            parseMailLists(*bytes, maillist_list);
+        }
+    } catch (const std::bad_alloc &) { // What was read until here stays.
+    }
+}
+
+void writeMailListFile() {
+    rewriteDataFile(settings().mail_file_maillist, [] { return formatMailLists(maillist_list); });
+}

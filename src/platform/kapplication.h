@@ -1,0 +1,48 @@
+#pragma once
+
+#include <QString>
+
+#include <memory>
+#include <string>
+
+class QCoreApplication;
+
+/// The language of the user's messages.
+class KLocale {
+public:
+    /// The text in the user's language, or the text itself where no translation is installed.
+    [[nodiscard]] QString translate(const char *text) const;
+
+    /// Finds the messages of the text domain `name` in `directory`.
+    void open(const QString &name, const QString &directory);
+
+private:
+    std::string domain_;
+};
+
+/// The process's toolkit application. Its construction takes the process's locale from the
+/// environment, so character classes follow that from then on.
+class KApplication {
+public:
+    /// Without a display (`hasDisplay` false) there are no widgets, but the locale and the paths
+    /// are the same. `name` is the application's name and its text domain.
+    KApplication(const char *program, const char *name, bool hasDisplay);
+    KApplication(const KApplication &) = delete;
+    KApplication &operator=(const KApplication &) = delete;
+    virtual ~KApplication();
+
+    static KLocale *getLocale();
+
+    /// The folder `name` among what is installed beside the program (share/...). It is found from
+    /// the program's own place, so that a build tree works like an installation.
+    static QString sharedFolder(const QString &name);
+
+    /// The name that the application was made with.
+    [[nodiscard]] QString name() const;
+
+private:
+    // The toolkit keeps references to both. No argument reaches it: all are the application's own.
+    int toolkitArgumentCount_ = 1;
+    char *toolkitArguments_[2];
+    std::unique_ptr<QCoreApplication> toolkit_;
+};

@@ -1,0 +1,61 @@
+#pragma once
+
+#include "platform/kapplication.h"
+
+#include <string>
+#include <vector>
+
+class KConfigWidget;
+class KControlDialog;
+class QWidget;
+
+/// The application base of a control module: the command line, the tabbed dialog with its buttons,
+/// help and the event loop.
+///
+/// Command line: "-init" (or "--init") is the init-only mode, which needs no display; "--help" and
+/// "--version" print and end the process with 0. Every other argument names a page; a name that is
+/// none of the application's pages ends the process with 2 and one line on standard error. All this
+/// comes before the toolkit is touched.
+class KControlApplication : public KApplication {
+public:
+    /// `pageNames` are the names that the command line may ask for.
+    KControlApplication(int &argc, char **argv, const char *name,
+                        const std::vector<const char *> &pageNames);
+    ~KControlApplication() override;
+
+    [[nodiscard]] bool isInitOnly() const { return dialog_ == nullptr; }
+
+    /// Runs until the dialog is closed, however that is done; returns the exit status.
+    int exec();
+
+    void setTitle(const QString &title);
+
+    virtual void init();
+    /// What OK and Apply do; nothing here.
+    virtual void applyChanges();
+    /// Shows the current page's help file.
+    virtual void help();
+    virtual void defaultValues();
+
+protected:
+    [[nodiscard]] bool isPageRequested(const char *name) const;
+    /// The parent of every page; null in init-only mode.
+    [[nodiscard]] QWidget *dialog() const;
+    /// Adds the page behind the others. `helpFile` is the name of a file in the help folder.
+    void addPage(KConfigWidget *page, const char *label, const char *helpFile);
+
+    /// Shows the dialog with the pages it has by now.
+    void showDialog();
+
+private:
+    struct CommandLine {
+        bool initOnly = false;
+        std::vector<std::string> pages; ///< Empty when all pages are wanted.
+    };
+    static CommandLine parseCommandLine(int argc, char **argv, const char *name,
+                                        const std::vector<const char *> &pageNames);
+    KControlApplication(const char *program, const char *name, CommandLine commandLine);
+
+    std::vector<std::string> requestedPages_;
+    std::unique_ptr<KControlDialog> dialog_;
+};

@@ -1,0 +1,45 @@
+#include "platform/knumericspinbox.h"
+
+#include <QLineEdit>
+#include <QSignalBlocker>
+
+#include <algorithm>
+
+KNumericSpinBox::KNumericSpinBox(QWidget *parent) : QSpinBox(parent) {
+    connect(this, &QSpinBox::valueChanged, this, &KNumericSpinBox::confine);
+}
+
+void KNumericSpinBox::setRange(int lowest, int highest) {
+    lowest_ = lowest;
+    highest_ = highest;
+    QSpinBox::setRange(lowest, highest);
+}
+
+void KNumericSpinBox::setStep(int step) {
+    setSingleStep(step);
+}
+
+void KNumericSpinBox::setValue(int value) {
+    // The toolkit's box clamps what is set; so its range reaches out to the value while that
+    // stands.
+    stored_ = value;
+    {
+        const QSignalBlocker noChangeYet{this};
+        QSpinBox::setRange(std::min(lowest_, value), std::max(highest_, value));
+    }
+    QSpinBox::setValue(value);
+}
+
+int KNumericSpinBox::getValue() const {
+    return value();
+}
+
+void KNumericSpinBox::setEditable(bool editable) {
+    lineEdit()->setReadOnly(!editable);
+}
+
+void KNumericSpinBox::confine(int value) {
+    if (value != stored_) {
+        QSpinBox::setRange(lowest_, highest_);
+    }
+}

@@ -1,0 +1,27 @@
+#pragma once
+
+#include <QSpinBox>
+
+/// A field for a whole number. A stored value outside the range is shown as it is and given back
+/// unchanged until the user changes it; whatever the user enters is inside the range.
+class KNumericSpinBox : public QSpinBox {
+    Q_OBJECT
+
+public:
+    explicit KNumericSpinBox(QWidget *parent = nullptr);
+
+    /// To be called before setValue; both ends belong to the range.
+    void setRange(int lowest, int highest);
+    void setStep(int step);
+    void setValue(int value);
+    [[nodiscard]] int getValue() const;
+    /// Whether the number can be typed, rather than only stepped.
+    void setEditable(bool editable);
+
+private:
+    void confine(int value);
+
+    int lowest_ = 0;
+    int highest_ = 0;
+    int stored_ = 0;
+};

@@ -1,0 +1,157 @@
+#include "platform/qlistbox.h"
+
+#include "platform/bytetext.h"
+
+#include <QAbstractListModel>
+#include <QKeyEvent>
+#include <QMouseEvent>
+
+#include <algorithm>
+#include <iterator>
+
+namespace {
+
+/// More than any window shows of a row; a file can give a row of any length.
+constexpr std::size_t mostBytesShown = 1024;
+
+} // namespace
+
+class Rows : public QAbstractListModel {
+public:
+    using QAbstractListModel::QAbstractListModel;
+
+    [[nodiscard]] int rowCount(const QModelIndex &parent = {}) const override {
+        return parent.isValid() ? 0 : static_cast<int>(texts_.size());
+    }
+
+    [[nodiscard]] QVariant data(const QModelIndex &index, int role) const override {
+        // The tool tip is for a text that is wider than the list.
+        if (role != Qt::DisplayRole && role != Qt::ToolTipRole) {
+            return {};
+        }
+        return textFromBytes(std::string_view{at(index.row())}.substr(0, mostBytesShown));
+    }
+
+    [[nodiscard]] const std::string &at(int row) const {
+        return texts_.at(static_cast<std::size_t>(row));
+    }
+
+    void append(std::vector<std::string> texts) {
+        if (texts.empty()) {
+            return;
+        }
+        const int first = rowCount();
+        beginInsertRows({}, first, first + static_cast<int>(texts.size()) - 1);
+        texts_.insert(texts_.end(), std::make_move_iterator(texts.begin()),
+                      std::make_move_iterator(texts.end()));
+        endInsertRows();
+    }
+
+    void change(int row, std::string text) {
+        texts_.at(static_cast<std::size_t>(row)) = std::move(text);
+        emit dataChanged(index(row), index(row));
+    }
+
+    void remove(int row) {
+        beginRemoveRows({}, row, row);
+        texts_.erase(texts_.begin() + row);
+        endRemoveRows();
+    }
+
+private:
+    std::vector<std::string> texts_;
+};
+
+QListBox::QListBox(QWidget *parent) : QListView(parent), rows_{new Rows(this)} {
+    setModel(rows_);
+    setUniformItemSizes(true);
+    setSelectionMode(SingleSelection);
+    setEditTriggers(NoEditTriggers);
+}
+
+int QListBox::count() const {
+    return rows_->rowCount();
+}
+
+const std::string &QListBox::text(int row) const {
+    return rows_->at(row);
+}
+
+void QListBox::append(std::string text) {
+    std::vector<std::string> texts;
+    texts.push_back(std::move(text));
+    append(std::move(texts));
+}
+
+void QListBox::append(std::vector<std::string> texts) {
+    rows_->append(std::move(texts));
+}
+
+void QListBox::changeText(int row, std::string text) {
+    rows_->change(row, std::move(text));
+}
+
+void QListBox::remove(int row) {
+    const bool wasCurrent = currentRow() == row;
+    rows_->remove(row);
+    if (wasCurrent && count() > 0) {
+        setCurrentRow(std::min(row, count() - 1));
+    }
+}
+
+std::optional<int> QListBox::currentRow() const {
+    const QModelIndex current = currentIndex();
+    if (!current.isValid() || !selectionModel()->isSelected(current)) {
+        return std::nullopt;
+    }
+    return current.row();
+}
+
+void QListBox::setCurrentRow(int row) {
+    setCurrentIndex(rows_->index(row));
+}
+
+void QListBox::setTopRow(int row) {
+    scrollTo(rows_->index(row), PositionAtTop);
+}
+
+void QListBox::focusInEvent(QFocusEvent *event) {
+    if (currentIndex().isValid()) {
+        QListView::focusInEvent(event);
+    } else {
+        // The view would make the first row current here, without highlighting it.
+        QAbstractScrollArea::focusInEvent(event);
+        viewport()->update();
+    }
+}
+
+void QListBox::keyPressEvent(QKeyEvent *event) {
+    if (event->key() != Qt::Key_Return && event->key() != Qt::Key_Enter) {
+        QListView::keyPressEvent(event);
+        return;
+    }
+    event->accept();
+    if (const std::optional<int> row = currentRow()) {
+        emitSelected(*row);
+    }
+}
+
+void QListBox::mouseDoubleClickEvent(QMouseEvent *event) {
+    const QModelIndex index = indexAt(event->position().toPoint());
+    event->accept();
+    if (event->button() == Qt::LeftButton && index.isValid()) {
+        setCurrentRow(index.row());
+        emitSelected(index.row());
+    }
+}
+
+QItemSelectionModel::SelectionFlags QListBox::selectionCommand(const QModelIndex &index,
+                                                               const QEvent *) const {
+    // Neither Ctrl nor a click below the rows takes the highlight off the current row.
+    return index.isValid() ? QItemSelectionModel::ClearAndSelect : QItemSelectionModel::NoUpdate;
+}
+
+void QListBox::emitSelected(int row) {
+    const std::string chosen = text(row); // The row may change while the signal is answered.
+    emit selected(chosen.c_str());
+}

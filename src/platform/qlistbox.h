@@ -1,0 +1,52 @@
+#pragma once
+
+#include <QListView>
+
+#include <optional>
+#include <string>
+#include <vector>
+
+/// A list of one byte text a row. The current row is always the highlighted one, and there is none
+/// until the user or the program chooses one: getting the focus does not choose. Filling, changing
+/// and scrolling stay linear with a million rows.
+class QListBox : public QListView {
+    Q_OBJECT
+
+public:
+    explicit QListBox(QWidget *parent = nullptr);
+
+    [[nodiscard]] int count() const;
+    /// `row` is 0 to count() - 1; so in all that follows.
+    [[nodiscard]] const std::string &text(int row) const;
+
+    void append(std::string text);
+    /// Adds many rows with one repaint.
+    void append(std::vector<std::string> texts);
+    void changeText(int row, std::string text);
+    /// When the current row goes, the one that takes its place, or else the last, becomes current.
+    void remove(int row);
+
+    [[nodiscard]] std::optional<int> currentRow() const;
+    void setCurrentRow(int row);
+    /// Scrolls so that the row is the first one shown, as far as there are rows below it.
+    void setTopRow(int row);
+
+    void selectAll() override {}
+
+signals:
+    /// A row was double-clicked, or Return or Enter pressed on it. The key goes no further: no
+    /// dialog around the list closes. The desktop's single-click setting plays no part.
+    void selected(const char *text);
+
+protected:
+    void focusInEvent(QFocusEvent *event) override;
+    void keyPressEvent(QKeyEvent *event) override;
+    void mouseDoubleClickEvent(QMouseEvent *event) override;
+    QItemSelectionModel::SelectionFlags selectionCommand(const QModelIndex &index,
+                                                         const QEvent *event) const override;
+
+private:
+    void emitSelected(int row);
+
+    class Rows *rows_;
+};

@@ -1,0 +1,30 @@
+#pragma once
+
+#include "platform/kconfigwidget.h"
+#include "widgets/settingsform.h"
+
+class EditSMTP;
+class QListBox;
+struct smtpreject_entry;
+
+/// The SMTP server's page: its settings, and its block list, which is edited in place.
+class MailSMTP : public KConfigWidget {
+    Q_OBJECT
+
+public:
+    MailSMTP(QWidget *parent, const char *name);
+
+    void loadValues() override;
+    void storeValues() override;
+
+public slots:
+    void Add();
+    void Remove();
+    void Selected(const char *text);
+    void Modify();
+    void Read(smtpreject_entry *entry, EditSMTP *dialog);
+
+private:
+    SettingsForm form_;
+    QListBox *rejects_;
+};

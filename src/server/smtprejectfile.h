@@ -1,0 +1,30 @@
+#pragma once
+
+#include "base/recordlist.h"
+
+#include <string>
+#include <string_view>
+
+/// The SMTP server's block list, one word a line:
+///
+///     spam.example.com  what follows the word is not read
+///
+/// Lines that begin with "#", "|", white space or a character that does not print are skipped.
+/// Reading puts each entry at the head, so that reading and writing reverse the order.
+
+struct smtpreject_entry {
+    std::string domain;
+    smtpreject_entry *next = nullptr;
+};
+
+/// Newest first.
+extern RecordChain<smtpreject_entry> smtpreject_list;
+
+/// Puts the entries of the file's bytes at the head of `list`. Throws std::bad_alloc with what was
+/// read until then in the list.
+void parseSmtpRejects(std::string_view bytes, RecordChain<smtpreject_entry> &list);
+std::string formatSmtpRejects(const RecordChain<smtpreject_entry> &list);
+
+/// Fills smtpreject_list anew from the file; empty when it cannot be read.
+void readSmtpRejectFile();
+void writeSmtpRejectFile();

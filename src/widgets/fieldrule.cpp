@@ -1,0 +1,68 @@
+#include "widgets/fieldrule.h"
+
+#include "platform/bytetext.h"
+
+#include <QLineEdit>
+#include <QToolTip>
+#include <QValidator>
+
+#include <algorithm>
+
+namespace {
+
+class RuleValidator : public QValidator {
+public:
+    RuleValidator(QLineEdit *field, const FieldRule &rule)
+        : QValidator(field), rule_{rule}, firstSet_{field->text().left(1)} {}
+
+    State validate(QString &input, int &position) const override {
+        const QString first = input.left(1);
+        if ((!first.isEmpty() && first != firstSet_ && rule_.refusedFirst.contains(first)) ||
+            std::ranges::any_of(
+                input, [this](QChar character) { return rule_.refused.contains(character); })) {
+            return Invalid;
+        }
+        cutToFit(input, position);
+        return Acceptable;
+    }
+
+private:
+    /// What was put in ends at `position`: there it is cut, so that nothing that stood in the field
+    /// before is pushed out.
+    void cutToFit(QString &input, int &position) const {
+        while (rule_.mostBytes > 0 && position > 0 &&
+               bytesFromText(input).size() > static_cast<std::size_t>(rule_.mostBytes)) {
+            const bool isPair = position > 1 && input.at(position - 1).isLowSurrogate() &&
+                                input.at(position - 2).isHighSurrogate();
+            const int length = isPair ? 2 : 1;
+            position -= length;
+            input.remove(position, length);
+        }
+    }
+
+    FieldRule rule_;
+    QString firstSet_;
+};
+
+void showToolTip(QLineEdit *field) {
+    QToolTip::showText(field->mapToGlobal(QPoint{0, field->height()}), field->toolTip(), field);
+}
+
+} // namespace
+
+void applyRule(QLineEdit *field, const FieldRule &rule) {
+    field->setToolTip(rule.toolTip);
+    field->setValidator(new RuleValidator(field, rule));
+    QObject::connect(field, &QLineEdit::inputRejected, field, [field] { showToolTip(field); });
+}
+
+void replaceByRule(QLineEdit *field, const QString &text) {
+    QString accepted = text;
+    int position = static_cast<int>(text.size());
+    if (field->validator() != nullptr &&
+        field->validator()->validate(accepted, position) != QValidator::Acceptable) {
+        showToolTip(field);
+        return;
+    }
+    field->setText(accepted);
+}

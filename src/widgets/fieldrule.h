@@ -1,0 +1,22 @@
+#pragma once
+
+#include <QString>
+
+class QLineEdit;
+
+/// What a field takes from the keyboard and the clipboard, because the file could not carry more.
+/// The text that the program puts into the field stays as it is, whatever the rule.
+struct FieldRule {
+    QString refused; ///< Characters that the text must not hold.
+    QString
+        refusedFirst;  ///< Characters that it must not begin with, unless it did when it was set.
+    int mostBytes = 0; ///< Longer input is cut between two characters; 0 for no limit.
+    QString toolTip;   ///< Says so; it appears at the field when input is refused.
+};
+
+/// To be called when the field shows its first text.
+void applyRule(QLineEdit *field, const FieldRule &rule);
+
+/// Puts a text into the field as if it were pasted over everything; when the rule refuses it, the
+/// field stays as it is and its tool tip appears.
+void replaceByRule(QLineEdit *field, const QString &text);

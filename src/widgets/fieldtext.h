@@ -1,0 +1,23 @@
+#pragma once
+
+#include <QString>
+
+#include <string>
+#include <string_view>
+
+class QLineEdit;
+class QWidget;
+
+/// How bytes get into a line edit and out of it; no page reads or fills a field in another way.
+
+/// An empty line edit that cuts nothing, however long the text.
+QLineEdit *newField(QWidget *parent);
+
+void showBytes(QLineEdit *field, std::string_view bytes);
+
+/// The field's text without what no record and no setting may hold: a line edit keeps pasted line
+/// breaks (and NUL), which become blanks here.
+std::string fieldBytes(const QLineEdit *field);
+
+/// The caption in the user's language.
+QString translated(const char *caption);

@@ -1,0 +1,51 @@
+#pragma once
+
+#include "platform/qlistbox.h"
+
+#include <QGroupBox>
+#include <QPushButton>
+
+class QVBoxLayout;
+
+/// A list box with a column of buttons to its right, in a group.
+class ListGroup : public QGroupBox {
+    Q_OBJECT
+
+public:
+    /// How the list box and the column share the width.
+    struct Stretch {
+        int box;
+        int column;
+    };
+
+    /// The group gets its border and spacings; a caller that has no room for them takes them back.
+    ListGroup(const char *caption, Stretch stretch, QWidget *parent);
+
+    [[nodiscard]] QListBox *box() const { return box_; }
+    /// For what stands below the buttons.
+    [[nodiscard]] QVBoxLayout *column() const { return column_; }
+
+    QPushButton *addButton(const char *caption);
+
+    /// Makes everything that the column holds by now `width` pixels wide.
+    void fixColumnWidth(int width);
+
+    /// Adds the three buttons that every list has and sends them, and a row that was chosen, to the
+    /// slots of `receiver`.
+    template <class Receiver, class AddSlot, class ModifySlot, class RemoveSlot, class SelectedSlot>
+    void addEditButtons(Receiver *receiver, AddSlot add, ModifySlot modify, RemoveSlot remove,
+                        SelectedSlot selected);
+
+private:
+    QListBox *box_;
+    QVBoxLayout *column_;
+};
+
+template <class Receiver, class AddSlot, class ModifySlot, class RemoveSlot, class SelectedSlot>
+void ListGroup::addEditButtons(Receiver *receiver, AddSlot add, ModifySlot modify,
+                               RemoveSlot remove, SelectedSlot selected) {
+    connect(addButton("Add..."), &QPushButton::clicked, receiver, add);
+    connect(addButton("Modify..."), &QPushButton::clicked, receiver, modify);
+    connect(addButton("Remove"), &QPushButton::clicked, receiver, remove);
+    connect(box_, &QListBox::selected, receiver, selected);
+}

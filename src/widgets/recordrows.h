@@ -1,0 +1,62 @@
+#pragma once
+
+#include "base/recordlist.h"
+#include "platform/qlistbox.h"
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+/// What keeps a list of records and the rows that show them in step. `shown` is a function that
+/// gives the text of a record's row. A row leads to its record by that text alone: to the first
+/// record, from the head, that shows the same bytes. Where texts are equal, rows and records are
+/// the same only as counted texts.
+
+template <class Record, class Shown>
+void appendRows(QListBox *box, const RecordChain<Record> &records, Shown shown) {
+    std::vector<std::string> texts;
+    for (const Record &record : records) {
+        texts.emplace_back(shown(record));
+    }
+    box->append(std::move(texts));
+}
+
+/// The link to the record that shows `text`; null when there is no text or no such record.
+template <class Record, class Shown>
+Record **linkToShown(Record **head, const char *text, Shown shown) {
+    if (text == nullptr) {
+        return nullptr;
+    }
+    const std::string_view wanted{text};
+    Record **link = findRecord(head, [&](const Record &record) { return shown(record) == wanted; });
+    return *link == nullptr ? nullptr : link;
+}
+
+/// The text of the current row; null when there is none. Valid until the list changes.
+inline const char *currentText(const QListBox *box) {
+    const std::optional<int> row = box->currentRow();
+    return row ? box->text(*row).c_str() : nullptr;
+}
+
+/// Puts the record at the head of its list and its row at the bottom of the box.
+template <class Record, class Shown>
+void addShown(QListBox *box, Record **head, Record record, Shown shown) {
+    box->append(std::string{shown(prependRecord(head, std::move(record)))});
+}
+
+inline void changeCurrentRow(QListBox *box, std::string_view text) {
+    if (const std::optional<int> row = box->currentRow()) {
+        box->changeText(*row, std::string{text});
+    }
+}
+
+/// Removes the current row and the record that it leads to, if there are both.
+template <class Record, class Shown>
+void removeCurrent(QListBox *box, Record **head, Shown shown) {
+    const std::optional<int> row = box->currentRow();
+    Record **link = linkToShown(head, currentText(box), shown);
+    if (row && link != nullptr) {
+        box->remove(*row);
+        removeRecord(link);
+    }
+}
