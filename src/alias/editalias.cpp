@@ -10,9 +10,7 @@
 
 namespace {
 
-std::string_view shown(const alias_list_entry &target) {
-    return target.alias;
-}
+std::string_view shown(const alias_list_entry &target) { return target.alias; }
 
 alias_list_entry copyOf(const alias_list_entry &target) {
     return {target.alias, target.type, target.bang};
@@ -40,13 +38,9 @@ EditAlias::EditAlias(QWidget *parent, const char *name, const alias_entry *alias
     addButtonRow();
 }
 
-std::string EditAlias::address() const {
-    return fieldBytes(address_);
-}
+std::string EditAlias::address() const { return fieldBytes(address_); }
 
-RecordChain<alias_list_entry> EditAlias::takeTargets() {
-    return std::move(targets_);
-}
+RecordChain<alias_list_entry> EditAlias::takeTargets() { return std::move(targets_); }
 
 void EditAlias::Add() {
     EditAliasEntry dialog{this, "Edit", nullptr};
@@ -57,9 +51,7 @@ void EditAlias::Add() {
     }
 }
 
-void EditAlias::Remove() {
-    removeCurrent(box_, &targets_.head, shown);
-}
+void EditAlias::Remove() { removeCurrent(box_, &targets_.head, shown); }
 
 void EditAlias::Selected(const char *text) {
     alias_list_entry **link = linkToShown(&targets_.head, text, shown);
@@ -73,9 +65,7 @@ void EditAlias::Selected(const char *text) {
     }
 }
 
-void EditAlias::Modify() {
-    Selected(currentText(box_));
-}
+void EditAlias::Modify() { Selected(currentText(box_)); }
 
 void EditAlias::Read(alias_list_entry *target, EditAliasEntry *dialog) {
     if (target != nullptr && dialog != nullptr) {

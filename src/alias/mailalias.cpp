@@ -8,9 +8,7 @@
 
 namespace {
 
-std::string_view shown(const alias_entry &alias) {
-    return alias.address;
-}
+std::string_view shown(const alias_entry &alias) { return alias.address; }
 
 } // namespace
 
@@ -37,9 +35,7 @@ void MailAlias::MailAliasAdd() {
     }
 }
 
-void MailAlias::MailAliasRemove() {
-    removeCurrent(aliases_, &alias_list.head, shown);
-}
+void MailAlias::MailAliasRemove() { removeCurrent(aliases_, &alias_list.head, shown); }
 
 void MailAlias::MailAliasSelected(const char *address) {
     alias_entry **link = linkToShown(&alias_list.head, address, shown);
@@ -53,9 +49,7 @@ void MailAlias::MailAliasSelected(const char *address) {
     }
 }
 
-void MailAlias::MailAliasModify() {
-    MailAliasSelected(currentText(aliases_));
-}
+void MailAlias::MailAliasModify() { MailAliasSelected(currentText(aliases_)); }
 
 void MailAlias::MailAliasRead(alias_entry *alias, EditAlias *dialog) {
     if (alias != nullptr && dialog != nullptr) {

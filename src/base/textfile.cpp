@@ -109,9 +109,7 @@ std::optional<std::string_view> LinePieces::next() {
     return piece;
 }
 
-std::string_view beforeNul(std::string_view piece) {
-    return piece.substr(0, piece.find('\0'));
-}
+std::string_view beforeNul(std::string_view piece) { return piece.substr(0, piece.find('\0')); }
 
 std::string_view lineText(std::string_view piece) {
     using namespace std::string_view_literals;

@@ -36,9 +36,7 @@ std::optional<std::uint32_t> addressOf(std::string_view word) {
     return address.s_addr;
 }
 
-std::string textOf(std::uint32_t address) {
-    return inet_ntoa(in_addr{address});
-}
+std::string textOf(std::uint32_t address) { return inet_ntoa(in_addr{address}); }
 
 std::string_view withoutBlanks(std::string_view text) {
     return text.substr(std::min(text.find_first_not_of(' '), text.size()));

@@ -1,8 +1,6 @@
 #include "config/settings.h"
 
-Setting::Setting(SettingTable &table, const char *key) : key_{key} {
-    table.all_.push_back(this);
-}
+Setting::Setting(SettingTable &table, const char *key) : key_{key} { table.all_.push_back(this); }
 
 Settings &settings() {
     static Settings store;

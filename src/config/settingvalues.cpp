@@ -49,7 +49,9 @@ std::int32_t parseTime(std::string_view text) {
 }
 
 std::string paddedToTwo(std::int32_t number) {
-    return (number < 10 ? " " : "") + formatSigned(number);
+    std::string text{number < 10 ? " " : ""};
+    text += formatSigned(number);
+    return text;
 }
 
 } // namespace
@@ -120,9 +122,7 @@ int compareNoCase(const char *a, const char *b) {
     }
 }
 
-std::string formatUnsigned(std::uint32_t value) {
-    return std::to_string(value);
-}
+std::string formatUnsigned(std::uint32_t value) { return std::to_string(value); }
 
 std::int32_t parseInteger(std::string_view text) {
     // atoi itself may do anything with a number that is too large; this is what it does here.
@@ -131,5 +131,7 @@ std::int32_t parseInteger(std::string_view text) {
 
 std::string formatSigned(std::int32_t value) {
     const auto magnitude = static_cast<std::uint32_t>(std::abs(std::int64_t{value}));
-    return (value < 0 ? "-" : "") + formatUnsigned(magnitude);
+    std::string text{value < 0 ? "-" : ""};
+    text += formatUnsigned(magnitude);
+    return text;
 }

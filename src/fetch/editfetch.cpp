@@ -8,8 +8,6 @@
 
 namespace {
 
-constexpr QSize labelSize{70, 18};
-
 /// A field for an array of `size` bytes.
 FieldRule ruleFor(std::size_t size) {
     const int mostBytes = static_cast<int>(size) - 1;
@@ -23,10 +21,12 @@ FieldRule ruleFor(std::size_t size) {
 
 EditFetch::EditFetch(QWidget *parent, const char *name, const pop_host *host)
     : FormDialog(parent, name, "POP Fetcher Settings") {
+    const QSize label = widened(
+        {70, 18}, {translated("&Server:"), translated("&Username:"), translated("&Password:")});
     const pop_host shown = host != nullptr ? *host : pop_host{};
-    server_ = addField("&Server:", labelSize, popHostText(shown.server));
-    user_ = addField("&Username:", labelSize, popHostText(shown.user));
-    password_ = addField("&Password:", labelSize, popHostText(shown.password));
+    server_ = addField("&Server:", label, popHostText(shown.server));
+    user_ = addField("&Username:", label, popHostText(shown.user));
+    password_ = addField("&Password:", label, popHostText(shown.password));
     fixSize({250, 140}, {247, 110});
     addButtonRow();
 
@@ -41,14 +41,8 @@ EditFetch::EditFetch(QWidget *parent, const char *name, const pop_host *host)
     applyRule(user_, userRule);
 }
 
-std::string EditFetch::server() const {
-    return fieldBytes(server_);
-}
+std::string EditFetch::server() const { return fieldBytes(server_); }
 
-std::string EditFetch::user() const {
-    return fieldBytes(user_);
-}
+std::string EditFetch::user() const { return fieldBytes(user_); }
 
-std::string EditFetch::password() const {
-    return fieldBytes(password_);
-}
+std::string EditFetch::password() const { return fieldBytes(password_); }

@@ -15,9 +15,7 @@ namespace {
 constexpr int columnWidth = 80;
 constexpr int spaceAbovePollTime = 40;
 
-std::string_view shown(const pop_host &host) {
-    return popHostText(host.user);
-}
+std::string_view shown(const pop_host &host) { return popHostText(host.user); }
 
 } // namespace
 
@@ -60,9 +58,7 @@ void MailFetch::MailFetchAdd() {
     }
 }
 
-void MailFetch::MailFetchRemove() {
-    removeCurrent(fetchers_, &pop_host_list.head, shown);
-}
+void MailFetch::MailFetchRemove() { removeCurrent(fetchers_, &pop_host_list.head, shown); }
 
 void MailFetch::MailFetchSelected(const char *user) {
     pop_host **link = linkToShown(&pop_host_list.head, user, shown);
@@ -76,9 +72,7 @@ void MailFetch::MailFetchSelected(const char *user) {
     }
 }
 
-void MailFetch::MailFetchModify() {
-    MailFetchSelected(currentText(fetchers_));
-}
+void MailFetch::MailFetchModify() { MailFetchSelected(currentText(fetchers_)); }
 
 void MailFetch::MailFetchRead(pop_host *host, EditFetch *dialog) {
     if (host != nullptr && dialog != nullptr) {

@@ -3,7 +3,14 @@
 #include "lists/maillistfile.h"
 #include "widgets/formdialog.h"
 
+#include <array>
 #include <vector>
+
+/// A text of a list and the caption of its field.
+struct TextRow {
+    const char *caption;
+    std::string maillist_entry::*field;
+};
 
 class EditListAddr;
 class KNumericSpinBox;
@@ -57,6 +64,9 @@ public slots:
     void browseHeader();
     void browseFooter();
 
+protected:
+    void resizeEvent(QResizeEvent *event) override;
+
 private:
     /// One address list: the working copy and the box that shows it.
     struct Addresses {
@@ -84,27 +94,36 @@ private:
         int width;
     };
 
-    QGroupBox *newAddressFields(const maillist_entry &list);
-    QHBoxLayout *addTextField(QBoxLayout *rows, const char *caption, QSize label,
-                              std::string maillist_entry::*field, const maillist_entry &list);
-    QLineEdit *addFileField(QBoxLayout *rows, const char *caption,
-                            std::string maillist_entry::*field, const maillist_entry &list,
-                            void (EditList::*browse)());
+    /// A widget's height, and the one it has where the window is too low for all rows.
+    struct RowHeight {
+        QWidget *widget;
+        int full;
+        int least;
+    };
+    void setRowHeights(int RowHeight::*which, int spacing);
+    QVBoxLayout *newRows(QGroupBox *group);
+
+    QGroupBox *newTextFields(const maillist_entry &list);
+    /// One row for each field, with labels of one width; returns the rows.
+    template <std::size_t count>
+    std::vector<QHBoxLayout *> addTextFields(QVBoxLayout *rows, int labelWidth,
+                                             const std::array<TextRow, count> &fields,
+                                             const maillist_entry &list);
     QGroupBox *newOptions(const maillist_entry &list);
-    void addTrigger(QBoxLayout *rows, const char *caption, const Unit &unit,
+    void addTrigger(QBoxLayout *rows, QLabel *caption, const Unit &unit,
                     std::int32_t maillist_entry::*field, const maillist_entry &list);
     ListGroup *newAddressGroup(const char *caption, Addresses &addresses,
                                const maillist_entry &list);
     void connectButtons();
-    void addSearchAndLoad(const Addresses &addresses, void (EditList::*search)(),
-                          void (EditList::*load)());
+    void addSearchAndLoad(ListGroup *group, void (EditList::*search)(), void (EditList::*load)());
 
     std::vector<TextField> texts_;
     std::vector<OptionBox> options_;
     std::vector<NumberField> triggers_;
-    QLineEdit *info_ = nullptr;
-    QLineEdit *header_ = nullptr;
-    QLineEdit *footer_ = nullptr;
+    std::array<QLineEdit *, 3> files_{}; ///< Info, header, footer.
+    std::vector<RowHeight> rowHeights_;
+    std::vector<QLayout *> rowLayouts_; ///< Those whose rows stand closer in a low window.
+    int rowsNeed_ = 0; ///< The height in pixels in which all rows have their full height.
     Addresses members_{&maillist_entry::member, {}};
     Addresses allowed_{&maillist_entry::allow, {}};
     Addresses blocked_{&maillist_entry::block, {}};

@@ -12,6 +12,4 @@ EditListAddr::EditListAddr(QWidget *parent, const char *name, const maillist_add
     addButtonRow();
 }
 
-std::string EditListAddr::email() const {
-    return fieldBytes(email_);
-}
+std::string EditListAddr::email() const { return fieldBytes(email_); }

@@ -30,10 +30,8 @@ EditListMember::EditListMember(QWidget *parent, const char *name, const maillist
     addButtonRow();
 }
 
-std::string EditListMember::email() const {
-    return fieldBytes(email_);
-}
-
 std::string EditListMember::addr() const {
-    return (digest_->isChecked() ? ":" : "") + email();
+    std::string addr{digest_->isChecked() ? ":" : ""};
+    addr += fieldBytes(email_);
+    return addr;
 }

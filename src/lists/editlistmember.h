@@ -15,8 +15,6 @@ public:
     /// `entry` is what the dialog starts with; null for an empty field and no digest.
     EditListMember(QWidget *parent, const char *name, const maillist_addr_entry *entry);
 
-    /// As it was typed.
-    [[nodiscard]] std::string email() const;
     /// As a record holds it: behind ":" for a member on the digest.
     [[nodiscard]] std::string addr() const;
 

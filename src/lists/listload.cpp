@@ -15,10 +15,6 @@ ListLoad::ListLoad(QWidget *parent, const char *name)
     addButtonRow();
 }
 
-std::string ListLoad::fileName() const {
-    return fieldBytes(fileName_);
-}
+std::string ListLoad::fileName() const { return fieldBytes(fileName_); }
 
-void ListLoad::browse() {
-    browseForFile(fileName_, this);
-}
+void ListLoad::browse() { browseForFile(fileName_, this); }

@@ -10,6 +10,4 @@ ListSearch::ListSearch(QWidget *parent, const char *name)
     addButtonRow();
 }
 
-std::string ListSearch::text() const {
-    return fieldBytes(text_);
-}
+std::string ListSearch::text() const { return fieldBytes(text_); }

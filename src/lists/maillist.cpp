@@ -8,9 +8,7 @@
 
 namespace {
 
-std::string_view shown(const maillist_entry &list) {
-    return list.name;
-}
+std::string_view shown(const maillist_entry &list) { return list.name; }
 
 } // namespace
 
@@ -37,9 +35,7 @@ void MailList::MailListAdd() {
     }
 }
 
-void MailList::MailListRemove() {
-    removeCurrent(lists_, &maillist_list.head, shown);
-}
+void MailList::MailListRemove() { removeCurrent(lists_, &maillist_list.head, shown); }
 
 void MailList::MailListSelected(const char *name) {
     maillist_entry **link = linkToShown(&maillist_list.head, name, shown);
@@ -53,9 +49,7 @@ void MailList::MailListSelected(const char *name) {
     }
 }
 
-void MailList::MailListModify() {
-    MailListSelected(currentText(lists_));
-}
+void MailList::MailListModify() { MailListSelected(currentText(lists_)); }
 
 void MailList::MailListRead(maillist_entry *record, EditList *editor) {
     if (record != nullptr && editor != nullptr) {

@@ -29,9 +29,10 @@ struct maillist_addr_entry {
 };
 
 /// Whether a member gets the digest rather than each message.
-inline bool isOnDigest(const maillist_addr_entry &member) {
-    return member.addr.starts_with(':');
-}
+inline bool isOnDigest(const maillist_addr_entry &member) { return member.addr.starts_with(':'); }
+
+/// An address as its record holds it.
+inline std::string_view addressStored(const maillist_addr_entry &entry) { return entry.addr; }
 
 /// A member's address proper.
 inline std::string_view addressShown(const maillist_addr_entry &member) {

@@ -39,6 +39,4 @@ QString KApplication::sharedFolder(const QString &name) {
     return QDir::cleanPath(QCoreApplication::applicationDirPath() + "/../share/" + name);
 }
 
-QString KApplication::name() const {
-    return QCoreApplication::applicationName();
-}
+QString KApplication::name() const { return QCoreApplication::applicationName(); }

@@ -89,9 +89,7 @@ KControlApplication::KControlApplication(const char *program, const char *name,
 
 KControlApplication::~KControlApplication() = default;
 
-int KControlApplication::exec() {
-    return QCoreApplication::exec();
-}
+int KControlApplication::exec() { return QCoreApplication::exec(); }
 
 void KControlApplication::setTitle(const QString &title) {
     if (dialog_) {
@@ -116,14 +114,13 @@ bool KControlApplication::isPageRequested(const char *name) const {
            std::ranges::find(requestedPages_, name) != requestedPages_.end();
 }
 
-QWidget *KControlApplication::dialog() const {
-    return dialog_.get();
-}
+QWidget *KControlApplication::dialog() const { return dialog_.get(); }
 
 void KControlApplication::addPage(KConfigWidget *page, const char *label, const char *helpFile) {
     dialog_->addPage(page, QString::fromUtf8(label), QString::fromUtf8(helpFile));
 }
 
 void KControlApplication::showDialog() {
+    dialog_->addButtons();
     dialog_->show();
 }

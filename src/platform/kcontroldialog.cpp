@@ -10,14 +10,24 @@
 #include <QTabWidget>
 
 KControlDialog::KControlDialog() : tabs_{new QTabWidget(this)} {
+    // The window is wide enough for all tabs, rather than scrolling them.
+    tabs_->setUsesScrollButtons(false);
+    (new QVBoxLayout(this))->addWidget(tabs_);
+    connect(new QShortcut(QKeySequence(Qt::Key_F1), this), &QShortcut::activated, this,
+            &KControlDialog::helpWanted);
+}
+
+void KControlDialog::addPage(KConfigWidget *page, const QString &label, const QString &helpFile) {
+    tabs_->addTab(page, label);
+    helpFiles_.append(helpFile);
+}
+
+void KControlDialog::addButtons() {
     auto *help = new QPushButton(QStringLiteral("Help"), this);
     auto *ok = new QPushButton(QStringLiteral("OK"), this);
     auto *apply = new QPushButton(QStringLiteral("Apply"), this);
     auto *cancel = new QPushButton(QStringLiteral("Cancel"), this);
     ok->setDefault(true);
-
-    // The window is wide enough for all tabs, rather than scrolling them.
-    tabs_->setUsesScrollButtons(false);
 
     auto *buttons = new QHBoxLayout;
     buttons->addWidget(help);
@@ -25,24 +35,15 @@ KControlDialog::KControlDialog() : tabs_{new QTabWidget(this)} {
     buttons->addWidget(ok);
     buttons->addWidget(apply);
     buttons->addWidget(cancel);
-    auto *layout = new QVBoxLayout(this);
-    layout->addWidget(tabs_);
-    layout->addLayout(buttons);
+    static_cast<QVBoxLayout *>(layout())->addLayout(buttons);
 
     connect(help, &QPushButton::clicked, this, &KControlDialog::helpWanted);
-    connect(new QShortcut(QKeySequence(Qt::Key_F1), this), &QShortcut::activated, this,
-            &KControlDialog::helpWanted);
     connect(apply, &QPushButton::clicked, this, &KControlDialog::apply);
     connect(ok, &QPushButton::clicked, this, [this] {
         this->apply();
         accept();
     });
     connect(cancel, &QPushButton::clicked, this, &QDialog::reject);
-}
-
-void KControlDialog::addPage(KConfigWidget *page, const QString &label, const QString &helpFile) {
-    tabs_->addTab(page, label);
-    helpFiles_.append(helpFile);
 }
 
 void KControlDialog::showHelp(const QString &folder) {

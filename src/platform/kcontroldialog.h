@@ -18,6 +18,9 @@ public:
     /// Takes the page over and puts it behind the others.
     void addPage(KConfigWidget *page, const QString &label, const QString &helpFile);
 
+    /// To be called when all pages are there: the Tab key then reaches the buttons behind them.
+    void addButtons();
+
     /// Shows the current page's help file from the language's folder below `folder`.
     void showHelp(const QString &folder);
 

@@ -15,9 +15,7 @@ void KNumericSpinBox::setRange(int lowest, int highest) {
     QSpinBox::setRange(lowest, highest);
 }
 
-void KNumericSpinBox::setStep(int step) {
-    setSingleStep(step);
-}
+void KNumericSpinBox::setStep(int step) { setSingleStep(step); }
 
 void KNumericSpinBox::setValue(int value) {
     // The toolkit's box clamps what is set; so its range reaches out to the value while that
@@ -30,13 +28,9 @@ void KNumericSpinBox::setValue(int value) {
     QSpinBox::setValue(value);
 }
 
-int KNumericSpinBox::getValue() const {
-    return value();
-}
+int KNumericSpinBox::getValue() const { return value(); }
 
-void KNumericSpinBox::setEditable(bool editable) {
-    lineEdit()->setReadOnly(!editable);
-}
+void KNumericSpinBox::setEditable(bool editable) { lineEdit()->setReadOnly(!editable); }
 
 void KNumericSpinBox::confine(int value) {
     if (value != stored_) {

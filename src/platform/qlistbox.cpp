@@ -69,13 +69,9 @@ QListBox::QListBox(QWidget *parent) : QListView(parent), rows_{new Rows(this)} {
     setEditTriggers(NoEditTriggers);
 }
 
-int QListBox::count() const {
-    return rows_->rowCount();
-}
+int QListBox::count() const { return rows_->rowCount(); }
 
-const std::string &QListBox::text(int row) const {
-    return rows_->at(row);
-}
+const std::string &QListBox::text(int row) const { return rows_->at(row); }
 
 void QListBox::append(std::string text) {
     std::vector<std::string> texts;
@@ -83,13 +79,9 @@ void QListBox::append(std::string text) {
     append(std::move(texts));
 }
 
-void QListBox::append(std::vector<std::string> texts) {
-    rows_->append(std::move(texts));
-}
+void QListBox::append(std::vector<std::string> texts) { rows_->append(std::move(texts)); }
 
-void QListBox::changeText(int row, std::string text) {
-    rows_->change(row, std::move(text));
-}
+void QListBox::changeText(int row, std::string text) { rows_->change(row, std::move(text)); }
 
 void QListBox::remove(int row) {
     const bool wasCurrent = currentRow() == row;
@@ -107,13 +99,9 @@ std::optional<int> QListBox::currentRow() const {
     return current.row();
 }
 
-void QListBox::setCurrentRow(int row) {
-    setCurrentIndex(rows_->index(row));
-}
+void QListBox::setCurrentRow(int row) { setCurrentIndex(rows_->index(row)); }
 
-void QListBox::setTopRow(int row) {
-    scrollTo(rows_->index(row), PositionAtTop);
-}
+void QListBox::setTopRow(int row) { scrollTo(rows_->index(row), PositionAtTop); }
 
 void QListBox::focusInEvent(QFocusEvent *event) {
     if (currentIndex().isValid()) {

@@ -11,6 +11,4 @@ EditSMTP::EditSMTP(QWidget *parent, const char *name, const smtpreject_entry *en
     addButtonRow();
 }
 
-std::string EditSMTP::address() const {
-    return fieldBytes(address_);
-}
+std::string EditSMTP::address() const { return fieldBytes(address_); }

@@ -24,6 +24,4 @@ MailDebatch::MailDebatch(QWidget *parent, const char *name)
 
 void MailDebatch::loadValues() {}
 
-void MailDebatch::storeValues() {
-    form_.store();
-}
+void MailDebatch::storeValues() { form_.store(); }

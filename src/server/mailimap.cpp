@@ -13,6 +13,4 @@ MailIMAP::MailIMAP(QWidget *parent, const char *name)
 
 void MailIMAP::loadValues() {}
 
-void MailIMAP::storeValues() {
-    form_.store();
-}
+void MailIMAP::storeValues() { form_.store(); }

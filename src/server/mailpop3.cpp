@@ -13,6 +13,4 @@ MailPOP3::MailPOP3(QWidget *parent, const char *name)
 
 void MailPOP3::loadValues() {}
 
-void MailPOP3::storeValues() {
-    form_.store();
-}
+void MailPOP3::storeValues() { form_.store(); }

@@ -10,9 +10,7 @@
 
 namespace {
 
-std::string_view shown(const smtpreject_entry &entry) {
-    return entry.domain;
-}
+std::string_view shown(const smtpreject_entry &entry) { return entry.domain; }
 
 } // namespace
 
@@ -34,9 +32,7 @@ MailSMTP::MailSMTP(QWidget *parent, const char *name)
 
 void MailSMTP::loadValues() {}
 
-void MailSMTP::storeValues() {
-    form_.store();
-}
+void MailSMTP::storeValues() { form_.store(); }
 
 void MailSMTP::Add() {
     EditSMTP dialog{this, "Edit", nullptr};
@@ -47,9 +43,7 @@ void MailSMTP::Add() {
     }
 }
 
-void MailSMTP::Remove() {
-    removeCurrent(rejects_, &smtpreject_list.head, shown);
-}
+void MailSMTP::Remove() { removeCurrent(rejects_, &smtpreject_list.head, shown); }
 
 void MailSMTP::Selected(const char *text) {
     smtpreject_entry **link = linkToShown(&smtpreject_list.head, text, shown);
@@ -63,9 +57,7 @@ void MailSMTP::Selected(const char *text) {
     }
 }
 
-void MailSMTP::Modify() {
-    Selected(currentText(rejects_));
-}
+void MailSMTP::Modify() { Selected(currentText(rejects_)); }
 
 void MailSMTP::Read(smtpreject_entry *entry, EditSMTP *dialog) {
     if (entry != nullptr && dialog != nullptr) {

@@ -15,9 +15,7 @@ bool beginsEntry(char first) {
     return std::isgraph(static_cast<unsigned char>(first)) != 0 && first != '#' && first != '|';
 }
 
-bool isSpace(char character) {
-    return std::isspace(static_cast<unsigned char>(character)) != 0;
-}
+bool isSpace(char character) { return std::isspace(static_cast<unsigned char>(character)) != 0; }
 
 } // namespace
 

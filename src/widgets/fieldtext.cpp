@@ -26,6 +26,4 @@ std::string fieldBytes(const QLineEdit *field) {
     return bytes;
 }
 
-QString translated(const char *caption) {
-    return KApplication::getLocale()->translate(caption);
-}
+QString translated(const char *caption) { return KApplication::getLocale()->translate(caption); }

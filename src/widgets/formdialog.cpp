@@ -3,6 +3,7 @@
 #include "widgets/fieldtext.h"
 #include "widgets/pagelayout.h"
 
+#include <QApplication>
 #include <QFileDialog>
 #include <QFrame>
 #include <QHBoxLayout>
@@ -17,6 +18,10 @@ namespace {
 constexpr QSize buttonSize{70, 30};
 /// The dialogs are low; what their borders leave over is shared out above and below the rows.
 constexpr int leastBorder = 2;
+
+int captionWidth(const QString &caption) {
+    return QFontMetrics{QApplication::font("QLabel")}.size(Qt::TextShowMnemonic, caption).width();
+}
 
 } // namespace
 
@@ -93,8 +98,15 @@ void browseForFile(QLineEdit *field, QWidget *parent) {
     }
 }
 
+QSize widened(QSize label, std::initializer_list<QString> captions) {
+    for (const QString &caption : captions) {
+        label = label.expandedTo({captionWidth(caption), 0});
+    }
+    return label;
+}
+
 QLabel *newLabel(const QString &caption, QSize size, QWidget *parent) {
     auto *label = new QLabel(caption, parent);
-    label->setFixedSize(size.expandedTo({label->sizeHint().width(), 0}));
+    label->setFixedSize(size.expandedTo({captionWidth(caption), 0}));
     return label;
 }

@@ -2,6 +2,7 @@
 
 #include <QDialog>
 
+#include <initializer_list>
 #include <string_view>
 
 class QFrame;
@@ -51,6 +52,10 @@ QPushButton *addBrowseButton(QHBoxLayout *row, int width, QWidget *parent);
 /// Lets the user pick a file, beginning with the one that the field names, and puts its path into
 /// the field; a cancelled choice leaves the field as it is.
 void browseForFile(QLineEdit *field, QWidget *parent);
+
+/// A label's size widened to the widest of the captions, so that fields below each other
+/// begin in one line.
+QSize widened(QSize label, std::initializer_list<QString> captions);
 
 /// A label of at least that size in which the whole caption is seen.
 QLabel *newLabel(const QString &caption, QSize size, QWidget *parent);

@@ -18,7 +18,6 @@ public:
         int column;
     };
 
-    /// The group gets its border and spacings; a caller that has no room for them takes them back.
     ListGroup(const char *caption, Stretch stretch, QWidget *parent);
 
     [[nodiscard]] QListBox *box() const { return box_; }
@@ -26,6 +25,10 @@ public:
     [[nodiscard]] QVBoxLayout *column() const { return column_; }
 
     QPushButton *addButton(const char *caption);
+
+    /// Takes back the border and the spacings that the group has on a page, for a window that has
+    /// no room for them.
+    void makeTight();
 
     /// Makes everything that the column holds by now `width` pixels wide.
     void fixColumnWidth(int width);
@@ -39,6 +42,7 @@ public:
 private:
     QListBox *box_;
     QVBoxLayout *column_;
+    QVBoxLayout *layout_;
 };
 
 template <class Receiver, class AddSlot, class ModifySlot, class RemoveSlot, class SelectedSlot>

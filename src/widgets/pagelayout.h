@@ -7,6 +7,7 @@
 /// The measures, in pixels, that all pages share.
 constexpr int pageBorder = 10;
 constexpr int groupSpacing = 5;
+constexpr int tightBorder = 2;
 constexpr int spaceAboveFirstRow = 10;
 
 inline QVBoxLayout *newPageLayout(QWidget *page) {

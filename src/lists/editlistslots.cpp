@@ -1,0 +1,172 @@
+#include "lists/editlist.h"
+
+#include "base/textfile.h"
+#include "lists/editlistaddr.h"
+#include "lists/editlistmember.h"
+#include "lists/listload.h"
+#include "lists/listsearch.h"
+#include "widgets/recordrows.h"
+
+#include <QLineEdit>
+#include <QMessageBox>
+
+#include <new>
+
+// What the buttons of the editor do; its window is made in editlist.cpp.
+
+namespace {
+
+/// The row after the current one, from the top again behind the last, that holds the needle. The
+/// current row itself is not looked at.
+std::optional<int> nextRowHolding(const QListBox *box, const std::string &needle) {
+    const int count = box->count();
+    const std::optional<int> current = box->currentRow();
+    const int tested = current ? count - 1 : count;
+    for (int step = 0; step < tested; ++step) {
+        const int row = (current.value_or(-1) + 1 + step) % count;
+        if (box->text(row).find(needle) != std::string::npos) {
+            return row;
+        }
+    }
+    return std::nullopt;
+}
+
+} // namespace
+
+void EditList::MemberAdd() { AddMember(members_.box, &members_.chain.head); }
+
+void EditList::MemberRemove() { Remove(members_.box, &members_.chain.head); }
+
+void EditList::MemberSelected(const char *text) {
+    SelectedMember(members_.box, &members_.chain.head, text);
+}
+
+void EditList::MemberModify() { MemberSelected(currentText(members_.box)); }
+
+void EditList::MemberSearch() { Search(members_.box, &members_.chain.head); }
+
+void EditList::MemberLoad() { Load(members_.box, &members_.chain.head); }
+
+void EditList::AllowAdd() { Add(allowed_.box, &allowed_.chain.head); }
+
+void EditList::AllowRemove() { Remove(allowed_.box, &allowed_.chain.head); }
+
+void EditList::AllowSelected(const char *text) {
+    Selected(allowed_.box, &allowed_.chain.head, text);
+}
+
+void EditList::AllowModify() { AllowSelected(currentText(allowed_.box)); }
+
+void EditList::AllowSearch() { Search(allowed_.box, &allowed_.chain.head); }
+
+void EditList::AllowLoad() { Load(allowed_.box, &allowed_.chain.head); }
+
+void EditList::BlockAdd() { Add(blocked_.box, &blocked_.chain.head); }
+
+void EditList::BlockRemove() { Remove(blocked_.box, &blocked_.chain.head); }
+
+void EditList::BlockSelected(const char *text) {
+    Selected(blocked_.box, &blocked_.chain.head, text);
+}
+
+void EditList::BlockModify() { BlockSelected(currentText(blocked_.box)); }
+
+void EditList::BlockSearch() { Search(blocked_.box, &blocked_.chain.head); }
+
+void EditList::BlockLoad() { Load(blocked_.box, &blocked_.chain.head); }
+
+void EditList::Add(QListBox *box, maillist_addr_entry **chain) {
+    EditListAddr dialog{this, "Edit", nullptr};
+    if (dialog.exec() == QDialog::Accepted) {
+        maillist_addr_entry entry;
+        Read(&entry, &dialog);
+        addShown(box, chain, std::move(entry), addressStored);
+    }
+}
+
+void EditList::AddMember(QListBox *box, maillist_addr_entry **chain) {
+    EditListMember dialog{this, "Edit", nullptr};
+    if (dialog.exec() == QDialog::Accepted) {
+        addShown(box, chain, maillist_addr_entry{dialog.addr()}, addressShown);
+    }
+}
+
+void EditList::Remove(QListBox *box, maillist_addr_entry **chain) {
+    removeCurrent(box, chain, addressShown);
+}
+
+void EditList::Selected(QListBox *box, maillist_addr_entry **chain, const char *text) {
+    maillist_addr_entry **link = linkToShown(chain, text, addressStored);
+    if (link == nullptr) {
+        return;
+    }
+    EditListAddr dialog{this, "edit", *link};
+    if (dialog.exec() == QDialog::Accepted) {
+        Read(*link, &dialog);
+        changeCurrentRow(box, (*link)->addr);
+    }
+}
+
+void EditList::SelectedMember(QListBox *box, maillist_addr_entry **chain, const char *text) {
+    maillist_addr_entry **link = linkToShown(chain, text, addressShown);
+    if (link == nullptr) {
+        return;
+    }
+    EditListMember dialog{this, "edit", *link};
+    if (dialog.exec() == QDialog::Accepted) {
+        (*link)->addr = dialog.addr();
+        changeCurrentRow(box, addressShown(**link));
+    }
+}
+
+void EditList::Search(QListBox *box, maillist_addr_entry ** /*chain*/) {
+    ListSearch dialog{this, "search"};
+    if (dialog.exec() != QDialog::Accepted) {
+        return;
+    }
+    if (const std::optional<int> row = nextRowHolding(box, dialog.text())) {
+        box->setCurrentRow(*row);
+        box->setTopRow(*row);
+    }
+}
+
+void EditList::Load(QListBox *box, maillist_addr_entry **chain) {
+    ListLoad dialog{this, "load"};
+    if (dialog.exec() != QDialog::Accepted) {
+        return;
+    }
+    std::vector<std::string> rows;
+    AddressChain loaded;
+    try {
+        const std::optional<std::string> bytes = readWholeFile(dialog.fileName());
+        if (!bytes) {
+            QMessageBox::information(
+                this, QStringLiteral("Mailling List Manager"),
+                QStringLiteral(
+                    "Could not open file for reading - perhaps permission denied?.\n\n"));
+            return;
+        }
+        rows = parseAddressLines(*bytes);
+        for (const std::string &address : rows) {
+            prependRecord(&loaded.head, {address});
+        }
+    } catch (const std::bad_alloc &) { // Then nothing is loaded, rather than a part.
+        return;
+    }
+    box->setUpdatesEnabled(false);
+    prependChain(chain, std::move(loaded));
+    box->append(std::move(rows));
+    box->setUpdatesEnabled(true);
+}
+
+void EditList::Read(maillist_addr_entry *entry, EditListAddr *dialog) {
+    if (entry != nullptr && dialog != nullptr) {
+        entry->addr = dialog->email();
+    }
+}
+
+void EditList::browseInfo() { browseForFile(files_[0], this); }
+
+void EditList::browseHeader() { browseForFile(files_[1], this); }
+
+void EditList::browseFooter() { browseForFile(files_[2], this); }
