@@ -54,14 +54,14 @@ void EditAlias::Add() {
 void EditAlias::Remove() { removeCurrent(box_, &targets_.head, shown); }
 
 void EditAlias::Selected(const char *text) {
-    alias_list_entry **link = linkToShown(&targets_.head, text, shown);
-    if (link == nullptr) {
+    alias_list_entry *target = recordShown(targets_.head, text, shown);
+    if (target == nullptr) {
         return;
     }
-    EditAliasEntry dialog{this, "edit", *link};
+    EditAliasEntry dialog{this, "edit", target};
     if (dialog.exec() == QDialog::Accepted) {
-        Read(*link, &dialog);
-        changeCurrentRow(box_, (*link)->alias);
+        Read(target, &dialog);
+        changeCurrentRow(box_, target->alias);
     }
 }
 

@@ -38,14 +38,14 @@ void MailAlias::MailAliasAdd() {
 void MailAlias::MailAliasRemove() { removeCurrent(aliases_, &alias_list.head, shown); }
 
 void MailAlias::MailAliasSelected(const char *address) {
-    alias_entry **link = linkToShown(&alias_list.head, address, shown);
-    if (link == nullptr) {
+    alias_entry *alias = recordShown(alias_list.head, address, shown);
+    if (alias == nullptr) {
         return;
     }
-    EditAlias dialog{this, "edit", *link};
+    EditAlias dialog{this, "edit", alias};
     if (dialog.exec() == QDialog::Accepted) {
-        MailAliasRead(*link, &dialog);
-        changeCurrentRow(aliases_, (*link)->address);
+        MailAliasRead(alias, &dialog);
+        changeCurrentRow(aliases_, alias->address);
     }
 }
 

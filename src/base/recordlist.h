@@ -104,8 +104,8 @@ struct RecordChain {
 
     Iterator<Record> begin() { return Iterator<Record>{head}; }
     Iterator<Record> end() { return Iterator<Record>{nullptr}; }
-    Iterator<const Record> begin() const { return Iterator<const Record>{head}; }
-    Iterator<const Record> end() const { return Iterator<const Record>{nullptr}; }
+    [[nodiscard]] Iterator<const Record> begin() const { return Iterator<const Record>{head}; }
+    [[nodiscard]] Iterator<const Record> end() const { return Iterator<const Record>{nullptr}; }
 };
 
 /// Puts the records of `front` before those of the list.

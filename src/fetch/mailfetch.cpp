@@ -61,14 +61,14 @@ void MailFetch::MailFetchAdd() {
 void MailFetch::MailFetchRemove() { removeCurrent(fetchers_, &pop_host_list.head, shown); }
 
 void MailFetch::MailFetchSelected(const char *user) {
-    pop_host **link = linkToShown(&pop_host_list.head, user, shown);
-    if (link == nullptr) {
+    pop_host *host = recordShown(pop_host_list.head, user, shown);
+    if (host == nullptr) {
         return;
     }
-    EditFetch dialog{this, "edit", *link};
+    EditFetch dialog{this, "edit", host};
     if (dialog.exec() == QDialog::Accepted) {
-        MailFetchRead(*link, &dialog);
-        changeCurrentRow(fetchers_, shown(**link));
+        MailFetchRead(host, &dialog);
+        changeCurrentRow(fetchers_, shown(*host));
     }
 }
 

@@ -96,26 +96,26 @@ void EditList::Remove(QListBox *box, maillist_addr_entry **chain) {
 }
 
 void EditList::Selected(QListBox *box, maillist_addr_entry **chain, const char *text) {
-    maillist_addr_entry **link = linkToShown(chain, text, addressStored);
-    if (link == nullptr) {
+    maillist_addr_entry *entry = recordShown(*chain, text, addressStored);
+    if (entry == nullptr) {
         return;
     }
-    EditListAddr dialog{this, "edit", *link};
+    EditListAddr dialog{this, "edit", entry};
     if (dialog.exec() == QDialog::Accepted) {
-        Read(*link, &dialog);
-        changeCurrentRow(box, (*link)->addr);
+        Read(entry, &dialog);
+        changeCurrentRow(box, entry->addr);
     }
 }
 
 void EditList::SelectedMember(QListBox *box, maillist_addr_entry **chain, const char *text) {
-    maillist_addr_entry **link = linkToShown(chain, text, addressShown);
-    if (link == nullptr) {
+    maillist_addr_entry *entry = recordShown(*chain, text, addressShown);
+    if (entry == nullptr) {
         return;
     }
-    EditListMember dialog{this, "edit", *link};
+    EditListMember dialog{this, "edit", entry};
     if (dialog.exec() == QDialog::Accepted) {
-        (*link)->addr = dialog.addr();
-        changeCurrentRow(box, addressShown(**link));
+        entry->addr = dialog.addr();
+        changeCurrentRow(box, addressShown(*entry));
     }
 }
 

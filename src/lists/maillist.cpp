@@ -38,14 +38,14 @@ void MailList::MailListAdd() {
 void MailList::MailListRemove() { removeCurrent(lists_, &maillist_list.head, shown); }
 
 void MailList::MailListSelected(const char *name) {
-    maillist_entry **link = linkToShown(&maillist_list.head, name, shown);
-    if (link == nullptr) {
+    maillist_entry *record = recordShown(maillist_list.head, name, shown);
+    if (record == nullptr) {
         return;
     }
-    EditList editor{this, "edit", *link};
+    EditList editor{this, "edit", record};
     if (editor.exec() == QDialog::Accepted) {
-        MailListRead(*link, &editor);
-        changeCurrentRow(lists_, (*link)->name);
+        MailListRead(record, &editor);
+        changeCurrentRow(lists_, record->name);
     }
 }
 

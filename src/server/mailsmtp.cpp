@@ -46,14 +46,14 @@ void MailSMTP::Add() {
 void MailSMTP::Remove() { removeCurrent(rejects_, &smtpreject_list.head, shown); }
 
 void MailSMTP::Selected(const char *text) {
-    smtpreject_entry **link = linkToShown(&smtpreject_list.head, text, shown);
-    if (link == nullptr) {
+    smtpreject_entry *entry = recordShown(smtpreject_list.head, text, shown);
+    if (entry == nullptr) {
         return;
     }
-    EditSMTP dialog{this, "edit", *link};
+    EditSMTP dialog{this, "edit", entry};
     if (dialog.exec() == QDialog::Accepted) {
-        Read(*link, &dialog);
-        changeCurrentRow(rejects_, (*link)->domain);
+        Read(entry, &dialog);
+        changeCurrentRow(rejects_, entry->domain);
     }
 }
 

@@ -32,6 +32,13 @@ Record **linkToShown(Record **head, const char *text, Shown shown) {
     return *link == nullptr ? nullptr : link;
 }
 
+/// The record that shows `text`; null when there is no text or no such record.
+template <class Record, class Shown>
+Record *recordShown(Record *head, const char *text, Shown shown) {
+    Record **link = linkToShown(&head, text, shown);
+    return link == nullptr ? nullptr : *link;
+}
+
 /// The text of the current row; null when there is none. Valid until the list changes.
 inline const char *currentText(const QListBox *box) {
     const std::optional<int> row = box->currentRow();
