@@ -6,6 +6,8 @@
 #include <algorithm>
 
 KNumericSpinBox::KNumericSpinBox(QWidget *parent) : QSpinBox(parent) {
+    // Some languages' digits or separators would show a stored number other than it is.
+    setLocale(QLocale::c());
     connect(this, &QSpinBox::valueChanged, this, &KNumericSpinBox::confine);
 }
 
