@@ -12,7 +12,7 @@ QString firstInstalled(const QString &folder, const QString &file) {
     QStringList languages = QLocale::system().uiLanguages();
     languages.append(QStringLiteral("en"));
     for (QString language : languages) {
-        const QString path = folder + '/' + language.replace('-', '_') + '/' + file;
+        QString path = folder + '/' + language.replace('-', '_') + '/' + file;
         if (QFileInfo(path).isReadable()) {
             return path;
         }

@@ -57,6 +57,9 @@ void applyRule(QLineEdit *field, const FieldRule &rule) {
 }
 
 void replaceByRule(QLineEdit *field, const QString &text) {
+    if (field->isReadOnly()) {
+        return;
+    }
     QString accepted = text;
     int position = static_cast<int>(text.size());
     if (field->validator() != nullptr &&

@@ -13,6 +13,8 @@ class QWidget;
 /// An empty line edit that cuts nothing, however long the text.
 QLineEdit *newField(QWidget *parent);
 
+/// A text of more than a megabyte, for which a line edit would take seconds and more, is not shown
+/// whole and cannot be edited; `fieldBytes` gives it back as it is.
 void showBytes(QLineEdit *field, std::string_view bytes);
 
 /// The field's text without what no record and no setting may hold: a line edit keeps pasted line
