@@ -73,7 +73,7 @@ void EditAliasEntry::store(alias_list_entry &target) const {
 
 void EditAliasEntry::browse() {
     const QString directory = QFileDialog::getExistingDirectory(this, {}, alias_->text());
-    if (!directory.isEmpty()) {
+    if (isWholePath(directory)) {
         replaceByRule(alias_, directory);
     }
 }

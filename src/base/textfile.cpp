@@ -3,6 +3,7 @@
 #include <cerrno>
 #include <csignal>
 #include <fcntl.h>
+#include <new>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -11,7 +12,7 @@ namespace {
 class FileDescriptor {
 public:
     FileDescriptor(const std::string &path, int flags)
-        : number_{::open(path.c_str(), flags | O_CLOEXEC | O_NONBLOCK | O_NOCTTY, 0666)} {}
+        : number_{opened(path.c_str(), flags | O_CLOEXEC | O_NOCTTY)} {}
     FileDescriptor(const FileDescriptor &) = delete;
     FileDescriptor &operator=(const FileDescriptor &) = delete;
     ~FileDescriptor() {
@@ -24,6 +25,19 @@ public:
     [[nodiscard]] int number() const { return number_; }
 
 private:
+    static int opened(const char *path, int flags) {
+        // A pipe must not make the program wait for its other end. A regular file that someone
+        // holds a lease on would fail here as well; it is worth the wait until the lease is given
+        // up.
+        const int number = ::open(path, flags | O_NONBLOCK, 0666);
+        struct stat status {};
+        if (number < 0 && errno == EWOULDBLOCK && ::stat(path, &status) == 0 &&
+            S_ISREG(status.st_mode)) {
+            return ::open(path, flags, 0666);
+        }
+        return number;
+    }
+
     int number_;
 };
 
@@ -53,6 +67,9 @@ std::optional<std::string> readWholeFile(const std::string &path) {
     struct stat status {};
     if (!file.isOpen() || ::fstat(file.number(), &status) != 0 || !S_ISREG(status.st_mode)) {
         return std::nullopt;
+    }
+    if (static_cast<std::size_t>(status.st_size) >= std::string{}.max_size()) {
+        throw std::bad_alloc{}; // The string would throw something else.
     }
     // One byte more than the size, so that the end is found without growing; a file that says
     // nothing of its size, or grows meanwhile, is read to its end all the same.

@@ -6,10 +6,9 @@
 #include <string_view>
 #include <vector>
 
-/// The addresses that a service lets in, asks for a password or shuts out. As text, items stand
-/// behind each other with commas between: "all", "none", or an IPv4 address with "/8", "/16",
-/// "/24",
-/// "/32" or, after a blank, a mask of its own:
+/// The addresses that a service lets in, asks for a password or shuts out. As text, its items have
+/// commas between them. An item is "all", "none", or an IPv4 address with "/8", "/16", "/24", "/32"
+/// or, after a blank, a mask of its own:
 ///
 ///     192.168.1.0/24, 10.0.0.0 255.255.128.0, 10.1.2.3/32
 

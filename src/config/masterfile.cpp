@@ -108,15 +108,18 @@ std::string formatMasterConfig(std::string_view masterTemplate) {
 
 int readMasterConfig() {
     const char *path = productPaths().master;
+    std::optional<std::string> bytes;
     try {
-        const std::optional<std::string> bytes = readWholeFile(path);
-        if (!bytes) {
-            std::printf("Couldn't open config file:%s\n", path);
-            std::fflush(stdout);
-            return 1;
+        bytes = readWholeFile(path);
+        if (bytes) {
+            parseMasterConfig(*bytes);
         }
-        parseMasterConfig(*bytes);
-    } catch (const std::bad_alloc &) { // What was read until here stays.
+    } catch (const std::bad_alloc &) { // What the store was given until here stays.
+    }
+    if (!bytes) {
+        std::printf("Couldn't open config file:%s\n", path);
+        std::fflush(stdout);
+        return 1;
     }
     return 0;
 }

@@ -126,7 +126,7 @@ std::string formatUnsigned(std::uint32_t value) { return std::to_string(value); 
 
 std::int32_t parseInteger(std::string_view text) {
     // atoi itself may do anything with a number that is too large; this is what it does here.
-    return wrapped(std::strtol(std::string{text}.c_str(), nullptr, 10));
+    return wrapped(std::strtoll(std::string{text}.c_str(), nullptr, 10));
 }
 
 std::string formatSigned(std::int32_t value) {

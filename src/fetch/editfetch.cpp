@@ -35,7 +35,7 @@ EditFetch::EditFetch(QWidget *parent, const char *name, const pop_host *host)
     FieldRule userRule = ruleFor(shown.user.size());
     // A new entry stands without a prefix at the beginning of a line, where these have a meaning of
     // their own or, like white space, are dropped.
-    userRule.refusedFirst = QStringLiteral("-*%| \t\r\n");
+    userRule.refusedFirst = QStringLiteral("-*%| \t\r\n") + QChar(u'\0');
     userRule.toolTip +=
         QStringLiteral("; not beginning with \"-\", \"*\", \"%\", \"|\" or a blank");
     applyRule(user_, userRule);

@@ -12,6 +12,7 @@
 #include <QLineEdit>
 #include <QPushButton>
 
+#include <algorithm>
 #include <array>
 
 namespace {
@@ -43,19 +44,21 @@ constexpr std::array<Option, 5> options{
      {"Block posts containing MIME attachments", MAILLIST_BLOCK_MIME},
      {"Allow digest subscriptions", MAILLIST_DIGEST}}};
 
-constexpr std::array<TextRow, 5> addressFields{{{"&Mail list Name:", &maillist_entry::name},
-                                                {"&Posting Address:", &maillist_entry::post},
-                                                {"&Subscribe Address:", &maillist_entry::admin},
-                                                {"&Support Address:", &maillist_entry::support},
-                                                {"&Moderator Address:", &maillist_entry::modrt}}};
-
-constexpr std::array<TextRow, 3> fileFields{{{"&Info file:", &maillist_entry::info},
-                                             {"&Header file:", &maillist_entry::header},
-                                             {"&Footer file:", &maillist_entry::footer}}};
-
 maillist_addr_entry copyOf(const maillist_addr_entry &entry) { return {entry.addr}; }
 
 } // namespace
+
+const std::array<EditList::TextRow, 5> EditList::addressRows{
+    {{"&Mail list Name:", &maillist_entry::name, nullptr},
+     {"&Posting Address:", &maillist_entry::post, nullptr},
+     {"&Subscribe Address:", &maillist_entry::admin, nullptr},
+     {"&Support Address:", &maillist_entry::support, nullptr},
+     {"&Moderator Address:", &maillist_entry::modrt, nullptr}}};
+
+const std::array<EditList::TextRow, 3> EditList::fileRows{
+    {{"&Info file:", &maillist_entry::info, &EditList::browseInfo},
+     {"&Header file:", &maillist_entry::header, &EditList::browseHeader},
+     {"&Footer file:", &maillist_entry::footer, &EditList::browseFooter}}};
 
 EditList::EditList(QWidget *parent, const char *name, const maillist_entry *list)
     : FormDialog(parent, name, "Mailing List") {
@@ -73,14 +76,22 @@ EditList::EditList(QWidget *parent, const char *name, const maillist_entry *list
     left->addWidget(newTextFields(shown));
     left->addWidget(newOptions(shown));
     left->addStretch();
-    right->addWidget(newAddressGroup("List Members", members_, shown));
-    right->addWidget(newAddressGroup("Allowed Posters", allowed_, shown));
-    right->addWidget(newAddressGroup("Blocked Posters", blocked_, shown));
+    right->addWidget(newAddressGroup("List Members", members_, shown,
+                                     {&EditList::MemberAdd, &EditList::MemberModify,
+                                      &EditList::MemberRemove, &EditList::MemberSearch,
+                                      &EditList::MemberLoad, &EditList::MemberSelected}));
+    right->addWidget(
+        newAddressGroup("Allowed Posters", allowed_, shown,
+                        {&EditList::AllowAdd, &EditList::AllowModify, &EditList::AllowRemove,
+                         &EditList::AllowSearch, &EditList::AllowLoad, &EditList::AllowSelected}));
+    right->addWidget(
+        newAddressGroup("Blocked Posters", blocked_, shown,
+                        {&EditList::BlockAdd, &EditList::BlockModify, &EditList::BlockRemove,
+                         &EditList::BlockSearch, &EditList::BlockLoad, &EditList::BlockSelected}));
     members_.box->setMinimumWidth(120);
     appendRows(members_.box, members_.chain, addressShown);
     appendRows(allowed_.box, allowed_.chain, addressStored);
     appendRows(blocked_.box, blocked_.chain, addressStored);
-    connectButtons();
     addButtonRow();
     setRowHeights(&RowHeight::full, tightBorder);
     rowsNeed_ = layout()->minimumSize().height();
@@ -116,38 +127,34 @@ QVBoxLayout *EditList::newRows(QGroupBox *group) {
 QGroupBox *EditList::newTextFields(const maillist_entry &list) {
     auto *group = new QGroupBox(QStringLiteral("List Addresses"), this);
     QVBoxLayout *rows = newRows(group);
-    addTextFields(rows, 110, addressFields, list);
-    const std::size_t firstFile = texts_.size();
-    const std::vector<QHBoxLayout *> fileRows = addTextFields(rows, 65, fileFields, list);
-    constexpr std::array browse{&EditList::browseInfo, &EditList::browseHeader,
-                                &EditList::browseFooter};
-    for (std::size_t file = 0; file < browse.size(); ++file) {
-        QPushButton *button = addBrowseButton(fileRows.at(file), buttonWidth, this);
-        connect(button, &QPushButton::clicked, this, browse.at(file));
-        rowHeights_.push_back({button, fieldHeight, leastFieldHeight});
-        files_.at(file) = texts_.at(firstFile + file).edit;
-    }
+    addTextFields(rows, 110, addressRows, list);
+    addTextFields(rows, 65, fileRows, list);
     return group;
 }
 
 template <std::size_t count>
-std::vector<QHBoxLayout *> EditList::addTextFields(QVBoxLayout *rows, int labelWidth,
-                                                   const std::array<TextRow, count> &fields,
-                                                   const maillist_entry &list) {
+void EditList::addTextFields(QVBoxLayout *rows, int labelWidth,
+                             const std::array<TextRow, count> &fields, const maillist_entry &list) {
     QSize label{labelWidth, labelHeight};
-    for (const auto &[caption, field] : fields) {
-        label = widened(label, {translated(caption)});
+    for (const TextRow &text : fields) {
+        label = widened(label, {translated(text.caption)});
     }
-    std::vector<QHBoxLayout *> added;
-    for (const auto &[caption, field] : fields) {
+    for (const auto &[caption, field, browse] : fields) {
         auto *row = new QHBoxLayout;
         rows->addLayout(row);
         QLineEdit *edit = addField(row, caption, label, list.*field);
         texts_.push_back({edit, field});
         rowHeights_.push_back({edit, fieldHeight, leastFieldHeight});
-        added.push_back(row);
+        if (browse != nullptr) {
+            QPushButton *button = addBrowseButton(row, buttonWidth, this);
+            connect(button, &QPushButton::clicked, this, browse);
+            rowHeights_.push_back({button, fieldHeight, leastFieldHeight});
+        }
     }
-    return added;
+}
+
+QLineEdit *EditList::fieldOf(std::string maillist_entry::*field) const {
+    return std::ranges::find(texts_, field, &TextField::field)->edit;
 }
 
 QGroupBox *EditList::newOptions(const maillist_entry &list) {
@@ -192,37 +199,21 @@ void EditList::addTrigger(QBoxLayout *rows, QLabel *caption, const Unit &unit,
 }
 
 ListGroup *EditList::newAddressGroup(const char *caption, Addresses &addresses,
-                                     const maillist_entry &list) {
+                                     const maillist_entry &list, const AddressSlots &slotsOf) {
     auto *group = new ListGroup(caption, {1000, 0}, this);
     group->makeTight();
     group->box()->setMinimumHeight(leastBoxHeight);
-    addresses.group = group;
-    addresses.box = group->box();
-    addresses.chain = (list.*addresses.field).copied(copyOf);
-    return group;
-}
-
-void EditList::connectButtons() {
-    members_.group->addEditButtons(this, &EditList::MemberAdd, &EditList::MemberModify,
-                                   &EditList::MemberRemove, &EditList::MemberSelected);
-    allowed_.group->addEditButtons(this, &EditList::AllowAdd, &EditList::AllowModify,
-                                   &EditList::AllowRemove, &EditList::AllowSelected);
-    blocked_.group->addEditButtons(this, &EditList::BlockAdd, &EditList::BlockModify,
-                                   &EditList::BlockRemove, &EditList::BlockSelected);
-    addSearchAndLoad(members_.group, &EditList::MemberSearch, &EditList::MemberLoad);
-    addSearchAndLoad(allowed_.group, &EditList::AllowSearch, &EditList::AllowLoad);
-    addSearchAndLoad(blocked_.group, &EditList::BlockSearch, &EditList::BlockLoad);
-}
-
-void EditList::addSearchAndLoad(ListGroup *group, void (EditList::*search)(),
-                                void (EditList::*load)()) {
-    connect(group->addButton("Search..."), &QPushButton::clicked, this, search);
-    connect(group->addButton("Load File"), &QPushButton::clicked, this, load);
+    group->addEditButtons(this, slotsOf.add, slotsOf.modify, slotsOf.remove, slotsOf.selected);
+    connect(group->addButton("Search..."), &QPushButton::clicked, this, slotsOf.search);
+    connect(group->addButton("Load File"), &QPushButton::clicked, this, slotsOf.load);
     group->fixColumnWidth(buttonWidth);
     group->column()->addStretch();
     for (QPushButton *button : group->findChildren<QPushButton *>()) {
         rowHeights_.push_back({button, buttonHeight, leastButtonHeight});
     }
+    addresses.box = group->box();
+    addresses.chain = (list.*addresses.field).copied(copyOf);
+    return group;
 }
 
 void EditList::store(maillist_entry &list) {

@@ -6,12 +6,6 @@
 #include <array>
 #include <vector>
 
-/// A text of a list and the caption of its field.
-struct TextRow {
-    const char *caption;
-    std::string maillist_entry::*field;
-};
-
 class EditListAddr;
 class KNumericSpinBox;
 class ListGroup;
@@ -72,7 +66,6 @@ private:
     struct Addresses {
         AddressChain maillist_entry::*field;
         AddressChain chain;
-        ListGroup *group = nullptr;
         QListBox *box = nullptr;
     };
     struct TextField {
@@ -103,24 +96,43 @@ private:
     void setRowHeights(int RowHeight::*which, int spacing);
     QVBoxLayout *newRows(QGroupBox *group);
 
+    using Slot = void (EditList::*)();
+
+    /// A text of the list, the caption of its field, and what "Browse..." behind it does, if it
+    /// stands there.
+    struct TextRow {
+        const char *caption;
+        std::string maillist_entry::*field;
+        Slot browse;
+    };
+    static const std::array<TextRow, 5> addressRows;
+    static const std::array<TextRow, 3> fileRows;
+
+    /// What the buttons beside an address list, and a chosen row of it, do.
+    struct AddressSlots {
+        Slot add;
+        Slot modify;
+        Slot remove;
+        Slot search;
+        Slot load;
+        void (EditList::*selected)(const char *);
+    };
+
     QGroupBox *newTextFields(const maillist_entry &list);
-    /// One row for each field, with labels of one width; returns the rows.
+    /// One row for each field, with labels of one width.
     template <std::size_t count>
-    std::vector<QHBoxLayout *> addTextFields(QVBoxLayout *rows, int labelWidth,
-                                             const std::array<TextRow, count> &fields,
-                                             const maillist_entry &list);
+    void addTextFields(QVBoxLayout *rows, int labelWidth, const std::array<TextRow, count> &fields,
+                       const maillist_entry &list);
+    [[nodiscard]] QLineEdit *fieldOf(std::string maillist_entry::*field) const;
     QGroupBox *newOptions(const maillist_entry &list);
     void addTrigger(QBoxLayout *rows, QLabel *caption, const Unit &unit,
                     std::int32_t maillist_entry::*field, const maillist_entry &list);
     ListGroup *newAddressGroup(const char *caption, Addresses &addresses,
-                               const maillist_entry &list);
-    void connectButtons();
-    void addSearchAndLoad(ListGroup *group, void (EditList::*search)(), void (EditList::*load)());
+                               const maillist_entry &list, const AddressSlots &slotsOf);
 
     std::vector<TextField> texts_;
     std::vector<OptionBox> options_;
     std::vector<NumberField> triggers_;
-    std::array<QLineEdit *, 3> files_{}; ///< Info, header, footer.
     std::vector<RowHeight> rowHeights_;
     std::vector<QLayout *> rowLayouts_; ///< Those whose rows stand closer in a low window.
     int rowsNeed_ = 0; ///< The height in pixels in which all rows have their full height.

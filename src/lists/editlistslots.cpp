@@ -165,8 +165,8 @@ void EditList::Read(maillist_addr_entry *entry, EditListAddr *dialog) {
     }
 }
 
-void EditList::browseInfo() { browseForFile(files_[0], this); }
+void EditList::browseInfo() { browseForFile(fieldOf(&maillist_entry::info), this); }
 
-void EditList::browseHeader() { browseForFile(files_[1], this); }
+void EditList::browseHeader() { browseForFile(fieldOf(&maillist_entry::header), this); }
 
-void EditList::browseFooter() { browseForFile(files_[2], this); }
+void EditList::browseFooter() { browseForFile(fieldOf(&maillist_entry::footer), this); }

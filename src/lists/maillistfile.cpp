@@ -183,7 +183,7 @@ void readMailListFile() {
         if (const auto bytes = readDataFile(settings().mail_file_maillist)) {
             parseMailLists(*bytes, maillist_list);
         }
-    } catch (const std::bad_alloc &) { // What was read until here stays.
+    } catch (const std::bad_alloc &) { // The records made until here stay.
     }
 }
 

@@ -28,6 +28,8 @@ void KNumericSpinBox::setValue(int value) {
         QSpinBox::setRange(std::min(lowest_, value), std::max(highest_, value));
     }
     QSpinBox::setValue(value);
+    // The field is made for the range; a number with more digits may not be seen whole in it.
+    setToolTip(value < lowest_ || value > highest_ ? text() : QString{});
 }
 
 int KNumericSpinBox::getValue() const { return value(); }
@@ -37,5 +39,6 @@ void KNumericSpinBox::setEditable(bool editable) { lineEdit()->setReadOnly(!edit
 void KNumericSpinBox::confine(int value) {
     if (value != stored_) {
         QSpinBox::setRange(lowest_, highest_);
+        setToolTip({});
     }
 }

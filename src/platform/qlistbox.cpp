@@ -5,6 +5,7 @@
 #include <QAbstractListModel>
 #include <QKeyEvent>
 #include <QMouseEvent>
+#include <QTextDocument>
 
 #include <algorithm>
 #include <iterator>
@@ -16,7 +17,7 @@ constexpr std::size_t mostBytesShown = 1024;
 
 } // namespace
 
-class Rows : public QAbstractListModel {
+class QListBox::Rows : public QAbstractListModel {
 public:
     using QAbstractListModel::QAbstractListModel;
 
@@ -26,10 +27,12 @@ public:
 
     [[nodiscard]] QVariant data(const QModelIndex &index, int role) const override {
         // The tool tip is for a text that is wider than the list.
-        if (role != Qt::DisplayRole && role != Qt::ToolTipRole) {
+        if (!index.isValid() || (role != Qt::DisplayRole && role != Qt::ToolTipRole)) {
             return {};
         }
-        return textFromBytes(std::string_view{at(index.row())}.substr(0, mostBytesShown));
+        const QString text =
+            textFromBytes(std::string_view{at(index.row())}.substr(0, mostBytesShown));
+        return role == Qt::ToolTipRole && Qt::mightBeRichText(text) ? text.toHtmlEscaped() : text;
     }
 
     [[nodiscard]] const std::string &at(int row) const {

@@ -48,5 +48,6 @@ protected:
 private:
     void emitSelected(int row);
 
-    class Rows *rows_;
+    class Rows;
+    Rows *rows_;
 };

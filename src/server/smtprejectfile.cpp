@@ -45,7 +45,7 @@ void readSmtpRejectFile() {
         if (const auto bytes = readDataFile(settings().mail_file_smtpreject)) {
             parseSmtpRejects(*bytes, smtpreject_list);
         }
-    } catch (const std::bad_alloc &) { // What was read until here stays.
+    } catch (const std::bad_alloc &) { // The records made until here stay.
     }
 }
 

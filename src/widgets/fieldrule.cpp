@@ -13,13 +13,14 @@ namespace {
 class RuleValidator : public QValidator {
 public:
     RuleValidator(QLineEdit *field, const FieldRule &rule)
-        : QValidator(field), rule_{rule}, firstSet_{field->text().left(1)} {}
+        : QValidator(field), rule_{rule}, textSet_{field->text()} {}
 
     State validate(QString &input, int &position) const override {
         const QString first = input.left(1);
-        if ((!first.isEmpty() && first != firstSet_ && rule_.refusedFirst.contains(first)) ||
-            std::ranges::any_of(
-                input, [this](QChar character) { return rule_.refused.contains(character); })) {
+        if ((!first.isEmpty() && first != textSet_.left(1) && rule_.refusedFirst.contains(first)) ||
+            std::ranges::any_of(input, [this](QChar character) {
+                return rule_.refused.contains(character) && !textSet_.contains(character);
+            })) {
             return Invalid;
         }
         cutToFit(input, position);
@@ -30,18 +31,22 @@ private:
     /// What was put in ends at `position`: there it is cut, so that nothing that stood in the field
     /// before is pushed out.
     void cutToFit(QString &input, int &position) const {
-        while (rule_.mostBytes > 0 && position > 0 &&
-               bytesFromText(input).size() > static_cast<std::size_t>(rule_.mostBytes)) {
-            const bool isPair = position > 1 && input.at(position - 1).isLowSurrogate() &&
-                                input.at(position - 2).isHighSurrogate();
+        auto excess = static_cast<qsizetype>(bytesFromText(input).size()) - rule_.mostBytes;
+        int kept = position;
+        while (rule_.mostBytes > 0 && excess > 0 && kept > 0) {
+            const bool isPair = kept > 1 && input.at(kept - 1).isLowSurrogate() &&
+                                input.at(kept - 2).isHighSurrogate();
             const int length = isPair ? 2 : 1;
-            position -= length;
-            input.remove(position, length);
+            kept -= length;
+            excess -=
+                static_cast<qsizetype>(bytesFromText(QStringView{input}.mid(kept, length)).size());
         }
+        input.remove(kept, position - kept);
+        position = kept;
     }
 
     FieldRule rule_;
-    QString firstSet_;
+    QString textSet_;
 };
 
 void showToolTip(QLineEdit *field) {
@@ -51,6 +56,9 @@ void showToolTip(QLineEdit *field) {
 } // namespace
 
 void applyRule(QLineEdit *field, const FieldRule &rule) {
+    if (field->isReadOnly()) {
+        return;
+    }
     field->setToolTip(rule.toolTip);
     field->setValidator(new RuleValidator(field, rule));
     QObject::connect(field, &QLineEdit::inputRejected, field, [field] { showToolTip(field); });

@@ -5,13 +5,13 @@
 class QLineEdit;
 
 /// What a field takes from the keyboard and the clipboard, because the file could not carry more.
-/// The text that the program puts into the field stays as it is, whatever the rule.
+/// The text that the program puts into the field stays as it is, whatever the rule, and what it
+/// holds against the rule may stay in what is typed.
 struct FieldRule {
-    QString refused; ///< Characters that the text must not hold.
-    QString
-        refusedFirst;  ///< Characters that it must not begin with, unless it did when it was set.
-    int mostBytes = 0; ///< Longer input is cut between two characters; 0 for no limit.
-    QString toolTip;   ///< Says so; it appears at the field when input is refused.
+    QString refused;      ///< Characters that the text must not hold.
+    QString refusedFirst; ///< Characters that it must not begin with.
+    int mostBytes = 0;    ///< Longer input is cut between two characters; 0 for no limit.
+    QString toolTip;      ///< Says so; it appears at the field when input is refused.
 };
 
 /// To be called when the field shows its first text.

@@ -1,7 +1,6 @@
 #include "widgets/fieldtext.h"
 
 #include "platform/bytetext.h"
-#include "platform/kapplication.h"
 
 #include <QLineEdit>
 #include <QVariant>
@@ -45,5 +44,3 @@ std::string fieldBytes(const QLineEdit *field) {
         bytes, [](char byte) { return byte == '\r' || byte == '\n' || byte == '\0'; }, ' ');
     return bytes;
 }
-
-QString translated(const char *caption) { return KApplication::getLocale()->translate(caption); }

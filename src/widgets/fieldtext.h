@@ -1,7 +1,5 @@
 #pragma once
 
-#include <QString>
-
 #include <string>
 #include <string_view>
 
@@ -20,6 +18,3 @@ void showBytes(QLineEdit *field, std::string_view bytes);
 /// The field's text without what no record and no setting may hold: a line edit keeps pasted line
 /// breaks (and NUL), which become blanks here.
 std::string fieldBytes(const QLineEdit *field);
-
-/// The caption in the user's language.
-QString translated(const char *caption);

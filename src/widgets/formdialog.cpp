@@ -3,7 +3,6 @@
 #include "widgets/fieldtext.h"
 #include "widgets/pagelayout.h"
 
-#include <QApplication>
 #include <QFileDialog>
 #include <QFrame>
 #include <QHBoxLayout>
@@ -18,10 +17,6 @@ namespace {
 constexpr QSize buttonSize{70, 30};
 /// The dialogs are low; what their borders leave over is shared out above and below the rows.
 constexpr int leastBorder = 2;
-
-int captionWidth(const QString &caption) {
-    return QFontMetrics{QApplication::font("QLabel")}.size(Qt::TextShowMnemonic, caption).width();
-}
 
 } // namespace
 
@@ -91,22 +86,16 @@ QPushButton *addBrowseButton(QHBoxLayout *row, int width, QWidget *parent) {
     return button;
 }
 
+bool isWholePath(const QString &path) {
+    return !path.isEmpty() && !path.contains(QChar::ReplacementCharacter);
+}
+
 void browseForFile(QLineEdit *field, QWidget *parent) {
+    if (field->isReadOnly()) {
+        return;
+    }
     const QString path = QFileDialog::getOpenFileName(parent, {}, field->text());
-    if (!path.isEmpty()) {
+    if (isWholePath(path)) {
         field->setText(path);
     }
-}
-
-QSize widened(QSize label, std::initializer_list<QString> captions) {
-    for (const QString &caption : captions) {
-        label = label.expandedTo({captionWidth(caption), 0});
-    }
-    return label;
-}
-
-QLabel *newLabel(const QString &caption, QSize size, QWidget *parent) {
-    auto *label = new QLabel(caption, parent);
-    label->setFixedSize(size.expandedTo({captionWidth(caption), 0}));
-    return label;
 }

@@ -1,13 +1,13 @@
 #pragma once
 
+#include "widgets/captions.h"
+
 #include <QDialog>
 
-#include <initializer_list>
 #include <string_view>
 
 class QFrame;
 class QHBoxLayout;
-class QLabel;
 class QLineEdit;
 class QPushButton;
 class QVBoxLayout;
@@ -16,8 +16,6 @@ class QVBoxLayout;
 /// "Cancel". A dialog collects input and applies nothing; who opened it reads it when it was
 /// accepted.
 class FormDialog : public QDialog {
-    Q_OBJECT
-
 public:
     static constexpr int fieldHeight = 25;
 
@@ -49,13 +47,10 @@ private:
 /// The push button "Browse..." at the end of a row.
 QPushButton *addBrowseButton(QHBoxLayout *row, int width, QWidget *parent);
 
+/// Whether a file dialog's answer names the file that was picked: there is none after "Cancel", and
+/// the toolkit replaces bytes of the name that are not UTF-8.
+bool isWholePath(const QString &path);
+
 /// Lets the user pick a file, beginning with the one that the field names, and puts its path into
 /// the field; a cancelled choice leaves the field as it is.
 void browseForFile(QLineEdit *field, QWidget *parent);
-
-/// A label's size widened to the widest of the captions, so that fields below each other
-/// begin in one line.
-QSize widened(QSize label, std::initializer_list<QString> captions);
-
-/// A label of at least that size in which the whole caption is seen.
-QLabel *newLabel(const QString &caption, QSize size, QWidget *parent);

@@ -1,6 +1,7 @@
 #include "widgets/settingsform.h"
 
 #include "platform/knumericspinbox.h"
+#include "widgets/captions.h"
 #include "widgets/fieldtext.h"
 #include "widgets/pagelayout.h"
 
@@ -83,8 +84,9 @@ QHBoxLayout *SettingsForm::newRow() {
 }
 
 QHBoxLayout *SettingsForm::newRow(const char *caption, QWidget *field) {
-    auto *label = new QLabel(QString::fromUtf8(caption), group_);
-    label->setFixedWidth(labelWidth_);
+    const QString text = QString::fromUtf8(caption);
+    auto *label = new QLabel(text, group_);
+    label->setFixedWidth(widened({labelWidth_, 0}, {text}).width());
     label->setBuddy(field);
     QHBoxLayout *row = newRow();
     row->addWidget(label);
