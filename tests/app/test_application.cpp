@@ -1,3 +1,5 @@
+#include "dialogdriver.h"
+
 #include "alias/aliasfile.h"
 #include "app/ktarvexapplication.h"
 #include "config/settings.h"
@@ -5,22 +7,16 @@
 #include "platform/kconfigwidget.h"
 #include "server/smtprejectfile.h"
 
-#include <QApplication>
 #include <QDialog>
-#include <QLabel>
-#include <QLineEdit>
 #include <QProcess>
-#include <QPushButton>
 #include <QSpinBox>
 #include <QTabWidget>
-#include <QTest>
 #include <QTextBrowser>
 
 #include <clocale>
 #include <filesystem>
 #include <fstream>
 #include <iterator>
-#include <map>
 
 namespace fs = std::filesystem;
 using namespace std::string_literals;
@@ -100,25 +96,7 @@ QDialog *mainDialog() {
     return nullptr;
 }
 
-void press(const char *caption) {
-    for (QPushButton *button : mainDialog()->findChildren<QPushButton *>()) {
-        if (button->text() == caption && button->parentWidget() == mainDialog()) {
-            QTest::mouseClick(button, Qt::LeftButton);
-            return;
-        }
-    }
-    QFAIL(caption);
-}
-
-template <class Field>
-Field *fieldCaptioned(const char *page, const char *caption) {
-    for (QLabel *label : mainDialog()->findChild<KConfigWidget *>(page)->findChildren<QLabel *>()) {
-        if (label->text() == caption) {
-            return qobject_cast<Field *>(label->buddy());
-        }
-    }
-    return nullptr;
-}
+QWidget *page(const char *name) { return mainDialog()->findChild<KConfigWidget *>(name); }
 
 } // namespace
 
@@ -151,7 +129,7 @@ private slots:
     }
 
     void applyWithoutEditsKeepsEveryValue() {
-        press("Apply");
+        press(mainDialog(), "Apply");
         QCOMPARE(read(master), expectedMaster("110", "kept.example.com"));
         QCOMPARE(read(aliases), expectedAliases);
         QCOMPARE(read(rejects), expectedRejects);
@@ -163,18 +141,15 @@ private slots:
         const std::string seen = expectedAliases + expectedRejects + expectedLists +
                                  expectedMaster("110", "kept.example.com");
         QCOMPARE(read(runs), seen);
-        press("Apply");
+        press(mainDialog(), "Apply");
         QCOMPARE(read(runs), seen + seen); // The second apply changed no byte more.
     }
 
     void editsReachTheirSettingsOnly() {
-        auto *port = fieldCaptioned<QSpinBox>("pop3server", "&Port:");
-        port->selectAll();
-        QTest::keyClicks(port, "1110");
-        auto *domains = fieldCaptioned<QLineEdit>("debatch", "&Local Domains:");
-        QTest::keyClicks(domains, "a.example.com, b");
+        type(fieldBeside<QSpinBox>(page("pop3server"), "&Port:"), "1110");
+        type(fieldBeside(page("debatch"), "&Local Domains:"), "a.example.com, b");
         QCOMPARE(read(master), expectedMaster("110", "kept.example.com"));
-        press("Apply");
+        press(mainDialog(), "Apply");
         QCOMPARE(read(master), expectedMaster("1110", "a.example.com\n\t b"));
     }
 
@@ -225,7 +200,7 @@ private slots:
         settings().mail_file_maillist.value.reset();
         fs::remove(runs);
         write(master, "");
-        press("Apply");
+        press(mainDialog(), "Apply");
         QVERIFY(fs::is_directory(aliases));
         QVERIFY(read(master).starts_with("| template\n"));
         QVERIFY(fs::exists(runs));
@@ -243,14 +218,14 @@ private slots:
         const fs::path installed = QCoreApplication::applicationDirPath().toStdString() +
                                    "/../share/kcmtarvex_mail/help/en/tarvex-mail-pop3.html";
         fs::rename(installed, product / "away");
-        press("Help");
+        press(mainDialog(), "Help");
         fs::rename(product / "away", installed);
         QVERIFY(browser->toPlainText().contains("\"tarvex-mail-pop3.html\" is not installed"));
     }
 
     void cancelAndEscapeWriteNothing() {
         fs::remove(runs);
-        press("Cancel");
+        press(mainDialog(), "Cancel");
         QVERIFY(!mainDialog()->isVisible());
         mainDialog()->show();
         QTest::keyClick(mainDialog(), Qt::Key_Escape);
@@ -260,7 +235,7 @@ private slots:
 
     void okAppliesAndCloses() {
         mainDialog()->show();
-        press("OK");
+        press(mainDialog(), "OK");
         QVERIFY(!mainDialog()->isVisible());
         QVERIFY(fs::exists(runs));
     }

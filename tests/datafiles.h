@@ -1,0 +1,48 @@
+#pragma once
+
+#include "base/textfile.h"
+
+#include <QTest>
+
+#include <algorithm>
+#include <filesystem>
+#include <random>
+#include <tuple>
+
+template <>
+inline char *QTest::toString(const std::string &text) {
+    return QTest::toString(QByteArray::fromStdString(text));
+}
+
+inline void addRows(const std::vector<std::tuple<const char *, std::string, std::string>> &rows) {
+    QTest::addColumn<std::string>("bytes");
+    QTest::addColumn<std::string>("expected");
+    for (const auto &[name, bytes, expected] : rows) {
+        QTest::newRow(name) << bytes << expected;
+    }
+}
+
+/// A path in the test's own product at which no file is yet.
+inline std::string newPath() {
+    std::filesystem::remove_all(TEST_PRODUCT);
+    std::filesystem::create_directories(TEST_PRODUCT);
+    return TEST_PRODUCT "/file";
+}
+
+/// Calls `check` with the setting at each kind of path at which no file can be read or written.
+inline void forUnusablePaths(std::optional<std::string> &setting, void (*check)()) {
+    for (const char *path : {"/", "/dev/full", "/missing/file", ""}) {
+        setting = path;
+        check();
+    }
+    setting.reset();
+    check();
+}
+
+/// Up to `longest` random bytes, high ones among them; no NUL and none of `excluded`.
+inline std::string randomText(std::mt19937 &random, std::string_view excluded, size_t longest) {
+    std::string text(random() % (longest + 1), 'x');
+    std::ranges::generate(text, [&] { return static_cast<char>(1 + random() % 255); });
+    std::erase_if(text, [&](char byte) { return excluded.find(byte) != excluded.npos; });
+    return text;
+}

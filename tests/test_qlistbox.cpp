@@ -1,0 +1,120 @@
+#include "platform/qlistbox.h"
+
+#include "dialogdriver.h"
+
+#include <QDialog>
+#include <QPushButton>
+
+namespace {
+
+/// A list in a dialog with a default button.
+struct Window {
+    explicit Window(int current, std::vector<std::string> rows = {"a", "b", "c", "d", "e"}) {
+        box->resize(200, 300);
+        box->append(std::move(rows));
+        ok->setDefault(true);
+        QObject::connect(ok, &QPushButton::clicked, &dialog, &QDialog::accept);
+        QObject::connect(box, &QListBox::selected,
+                         [this](const char *text) { selected.emplace_back(text); });
+        dialog.show();
+        if (current >= 0) {
+            box->setCurrentRow(current);
+        }
+    }
+
+    /// The row that buttons act on, or -1; several when another one is highlighted or focused.
+    [[nodiscard]] QString current() const {
+        QStringList rows{QString::number(box->currentRow().value_or(-1))};
+        QModelIndexList indexes = box->selectionModel()->selectedIndexes();
+        indexes << box->currentIndex();
+        for (const QModelIndex &index : indexes) {
+            rows << QString::number(index.row());
+        }
+        rows.removeDuplicates();
+        return rows.join(" and ");
+    }
+
+    QDialog dialog;
+    QPushButton *ok = new QPushButton("OK", &dialog);
+    QListBox *box = new QListBox(&dialog);
+    std::vector<std::string> selected;
+};
+
+} // namespace
+
+class TestQListBox : public QObject {
+    Q_OBJECT
+
+private slots:
+    void rowIsChosen() {
+        const std::string text = "b\xff\xc3";
+        const Window window{1, {"a", text}};
+        QTest::keyClick(window.box, Qt::Key_Return);
+        QTest::keyClick(window.box, Qt::Key_Enter);
+        doubleClickRow(window.box, 1);
+        QCOMPARE(window.selected, (std::vector{text, text, text}));
+        QVERIFY(window.dialog.isVisible());
+    }
+
+    void focusChoosesNoRow() {
+        Window window{-1};
+        QVERIFY(QTest::qWaitForWindowActive(&window.dialog));
+        QTest::keyClick(window.ok, Qt::Key_Tab);
+        QVERIFY(window.box->hasFocus());
+        QTest::keyClick(window.box, Qt::Key_Return);
+        QVERIFY(window.selected.empty());
+        QVERIFY(window.dialog.isVisible());
+        QCOMPARE(window.current(), "-1");
+    }
+
+    void mouse() {
+        const QPoint below{20, 290};
+        const Window window{1};
+        QWidget *viewport = window.box->viewport();
+        for (const Qt::KeyboardModifier modifier : {Qt::NoModifier, Qt::ControlModifier}) {
+            QTest::mouseClick(viewport, Qt::LeftButton, modifier, centreOfRow(window.box, 3));
+            QCOMPARE(window.current(), "3");
+            QTest::mouseClick(viewport, Qt::LeftButton, modifier, below);
+            QCOMPARE(window.current(), "3");
+            QTest::mousePress(viewport, Qt::LeftButton, modifier, centreOfRow(window.box, 0));
+            const QPointF to = centreOfRow(window.box, 2);
+            QMouseEvent move{QEvent::MouseMove, to,      viewport->mapToGlobal(to), Qt::NoButton,
+                             Qt::LeftButton,    modifier};
+            QApplication::sendEvent(viewport, &move);
+            QTest::mouseRelease(viewport, Qt::LeftButton, modifier, to.toPoint());
+            QCOMPARE(window.current(), "2");
+        }
+    }
+
+    void keys() {
+        using Case = std::tuple<const char *, int, Qt::Key, Qt::KeyboardModifier, const char *>;
+        for (const auto &[name, from, key, modifier, current] : std::initializer_list<Case>{
+                 {"Ctrl+A, no row", -1, Qt::Key_A, Qt::ControlModifier, "-1"},
+                 {"Ctrl+C, no row", -1, Qt::Key_C, Qt::ControlModifier, "-1"},
+                 {"Ctrl+Down", 1, Qt::Key_Down, Qt::ControlModifier, "2"},
+                 {"Shift+Down", 1, Qt::Key_Down, Qt::ShiftModifier, "2"},
+                 {"Ctrl+Space", 1, Qt::Key_Space, Qt::ControlModifier, "1"}}) {
+            const Window window{from};
+            QTest::keyClick(window.box, key, modifier);
+            QVERIFY2(window.current() == current, name);
+        }
+    }
+
+    void removal() {
+        using Case = std::tuple<int, int, const char *, const char *>;
+        for (const auto &[from, removed, current, left] :
+             std::initializer_list<Case>{{0, 0, "0", "b|c|d|e"},
+                                         {4, 4, "3", "a|b|c|d"},
+                                         {3, 1, "2", "a|c|d|e"},
+                                         {1, 3, "1", "a|b|c|e"},
+                                         {-1, 0, "-1", "b|c|d|e"}}) {
+            const Window window{from};
+            window.box->remove(removed);
+            QCOMPARE(window.current(), current);
+            QCOMPARE(rowsOf(window.box), left);
+        }
+    }
+};
+
+QTEST_MAIN(TestQListBox)
+#include "test_qlistbox.moc"

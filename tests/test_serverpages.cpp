@@ -1,0 +1,86 @@
+#include "config/settings.h"
+#include "server/maildebatch.h"
+#include "server/mailimap.h"
+#include "server/mailpop3.h"
+#include "server/mailsmtp.h"
+
+#include "dialogdriver.h"
+
+#include <memory>
+
+namespace {
+
+/// The texts of all settings in table order; none for an absent text.
+std::vector<std::optional<std::string>> allValues() {
+    std::vector<std::optional<std::string>> values;
+    for (Setting *setting : settings().all()) {
+        values.push_back(setting->exchange(std::nullopt));
+    }
+    return values;
+}
+
+using NewPage = std::unique_ptr<KConfigWidget> (*)();
+
+template <class Page>
+std::unique_ptr<KConfigWidget> newPage() {
+    return std::make_unique<Page>(nullptr, "page");
+}
+
+using Case = std::tuple<NewPage, std::string, const char *, const char *, const char *>;
+
+} // namespace
+
+class TestServerPages : public QObject {
+    Q_OBJECT
+
+private slots:
+    /// What the fields would not take from the user, or could make something else of, stays.
+    void oneEditChangesItsSetting() {
+        settingByKey("smtp.sock.port", "70000");
+        settingByKey("smtp.allow", "10.0.0.0 255.255.128.0, 192.168.0.0/16");
+        settingByKey("smtp.auth", "none");
+        settingByKey("smtp.hosts", "\xff\xc3 not UTF-8");
+        settingByKey("mail.domains", "  two  blanks ");
+        const NewPage delivery = newPage<MailDebatch>;
+        std::vector<Case> cases{
+            {delivery, "mail.debatch.time", "&Idle time (secs):", "7", "7"},
+            {delivery, "mail.domains", "&Local Domains:", " a.example  b ", " a.example  b "},
+            {delivery, "smtp.direct", "&Direct Send:", "yes", "yes"},
+            {delivery, "smtp.hosts", "&Remote SMTP Server:", "", ""},
+            {delivery, "smtp.time", "&Poll Time (mins):", "30", "30"},
+            {delivery, "mail.auto.send", "&Auto connect queue size:", "9", "9"},
+            {delivery, "mail.from.force", "&From Header force:", "me", "me"},
+            {newPage<MailSMTP>, "smtp.auth", "A&uth Access:", "", ""}};
+        for (const auto &[page, prefix] :
+             std::initializer_list<std::pair<NewPage, std::string>>{{newPage<MailSMTP>, "smtp"},
+                                                                    {newPage<MailPOP3>, "pop"},
+                                                                    {newPage<MailIMAP>, "imap"}}) {
+            cases.insert(cases.end(),
+                         {{page, prefix + ".sock.enabled", "Enable server", nullptr, "no"},
+                          {page, prefix + ".sock.port", "&Port:", "65535", "65535"},
+                          {page, prefix + ".sock.timeout", "&Timeout (secs):", "999", "999"},
+                          {page, prefix + ".sock.max", "&Max Connections:", "0", "0"},
+                          {page, prefix + ".allow", "&Allow Access:", "x,ALL", "all"},
+                          {page, prefix + ".block", "&Block Access:", "10.0.0.0/8", "10.0.0.0/8"}});
+        }
+        for (const auto &[make, key, caption, typed, value] : cases) {
+            auto values = allValues();
+            const auto page = make();
+            page->storeValues();
+            QVERIFY(allValues() == values);
+            page->show();
+            if (typed == nullptr) {
+                press(page.get(), caption);
+            } else {
+                type(fieldBeside<QWidget>(page.get(), caption), typed);
+            }
+            page->storeValues();
+            const auto at = std::ranges::find(settings().all(), key, &Setting::key);
+            auto &changed = values.at(static_cast<std::size_t>(at - settings().all().begin()));
+            QVERIFY2(std::exchange(changed, value) != value && allValues() == values, key.c_str());
+        }
+    }
+};
+
+QTEST_MAIN(TestServerPages)
+#include "test_serverpages.moc"

@@ -1,0 +1,91 @@
+#include "base/textfile.h"
+
+#include <QDir>
+#include <QTest>
+
+#include <csignal>
+#include <fcntl.h>
+#include <sys/resource.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace {
+
+const std::string folder = TEST_PRODUCT;
+const std::string file = folder + "/file";
+const std::string fifo = folder + "/fifo";
+
+/// The pieces, each with a semicolon behind it.
+QByteArray cut(std::string_view bytes, std::size_t longest = 4) {
+    QByteArray text;
+    LinePieces pieces{bytes, longest};
+    while (const auto piece = pieces.next()) {
+        text += std::string{*piece} + ';';
+    }
+    return text;
+}
+
+} // namespace
+
+class TestTextFile : public QObject {
+    Q_OBJECT
+
+private slots:
+    void init() {
+        QDir{TEST_PRODUCT}.removeRecursively();
+        QVERIFY(QDir{}.mkpath(TEST_PRODUCT) && mkfifo(fifo.c_str(), 0600) == 0);
+    }
+
+    void filesComeBackByteForByte() {
+        for (const std::string &bytes : {std::string{"a\r\n\0\xff", 5}, std::string{}}) {
+            QVERIFY(rewriteFile(file, bytes) && readWholeFile(file) == bytes);
+        }
+        // Says that it is empty, but is not.
+        QVERIFY(readWholeFile("/proc/self/status").value_or("").starts_with("Name:"));
+    }
+
+    void whatIsNoFileIsNeitherReadNorWritten() {
+        for (const std::string &path : {folder, fifo, fifo + "/x", std::string{"/dev/full"}}) {
+            QVERIFY2(!readWholeFile(path) && !rewriteFile(path, "bytes"), path.c_str());
+        }
+        // A pipe takes what it has room for; the rest must not be waited for.
+        const int reader = open(fifo.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC);
+        QVERIFY(!rewriteFile(fifo, std::string(2'000'000, 'x')));
+        close(reader);
+    }
+
+    void linksAndModeStay() {
+        const std::string link = folder + "/link";
+        QVERIFY(rewriteFile(file, "a longer text") && chmod(file.c_str(), 0640) == 0);
+        QCOMPARE(symlink("file", link.c_str()), 0);
+        struct stat before {};
+        QCOMPARE(stat(file.c_str(), &before), 0);
+        QVERIFY(rewriteFile(link, "short") && readWholeFile(file) == "short");
+        struct stat after {};
+        QCOMPARE(stat(file.c_str(), &after), 0);
+        QVERIFY(after.st_ino == before.st_ino && after.st_mode == before.st_mode);
+    }
+
+    void theSizeLimitFailsTheWriteAndNotTheProcess() {
+        rlimit before{};
+        getrlimit(RLIMIT_FSIZE, &before);
+        const rlimit limit{10, before.rlim_max};
+        setrlimit(RLIMIT_FSIZE, &limit);
+        const bool isWritten = rewriteFile(file, "more than ten bytes");
+        setrlimit(RLIMIT_FSIZE, &before);
+        QVERIFY(!isWritten && std::signal(SIGXFSZ, SIG_DFL) == SIG_DFL);
+    }
+
+    void linesAreCutAtTheirEndAndAtTheLimit() {
+        QCOMPARE(cut("\n\n"), "\n;\n;");
+        QCOMPARE(cut("abc\nd"), "abc\n;d;"); // One byte below the limit.
+        QCOMPARE(cut("abcd\ne"), "abcd;\n;e;");
+        QCOMPARE(cut("abcdefg\n"), "abcd;efg\n;");
+        QCOMPARE(cut("abcd") + cut(""), "abcd;");
+        QCOMPARE(cut({"a\r\0\n\n", 5}), QByteArray("a\r\0\n;\n;", 7));
+        QCOMPARE(cut("abcdefg\nh\n", LinePieces::unlimited), "abcdefg\n;h\n;");
+    }
+};
+
+QTEST_GUILESS_MAIN(TestTextFile)
+#include "test_textfile.moc"
