@@ -68,7 +68,7 @@ private slots:
     void randomTextsSurviveWritingAndReading() {
         std::mt19937 random{1};
         for (int round = 0; round < 500; ++round) {
-            const std::string text = randomText(random, ",\r\n \t", 300) + ",|,%:,#";
+            const std::string text = randomText(random, ",\r\n \t", 300) + "x,|,%:,#";
             settings().admin_email.value = text;
             const std::string bytes = formatMasterConfig("%smtp.hosts:\n%admin.email:");
             settings().admin_email.value.reset();
