@@ -43,26 +43,13 @@ std::string EditAlias::address() const { return fieldBytes(address_); }
 RecordChain<alias_list_entry> EditAlias::takeTargets() { return std::move(targets_); }
 
 void EditAlias::Add() {
-    EditAliasEntry dialog{this, "Edit", nullptr};
-    if (dialog.exec() == QDialog::Accepted) {
-        alias_list_entry target;
-        Read(&target, &dialog);
-        addShown(box_, &targets_.head, std::move(target), shown);
-    }
+    addByDialog<EditAliasEntry>(this, box_, &targets_.head, &EditAlias::Read, shown);
 }
 
 void EditAlias::Remove() { removeCurrent(box_, &targets_.head, shown); }
 
 void EditAlias::Selected(const char *text) {
-    alias_list_entry *target = recordShown(targets_.head, text, shown);
-    if (target == nullptr) {
-        return;
-    }
-    EditAliasEntry dialog{this, "edit", target};
-    if (dialog.exec() == QDialog::Accepted) {
-        Read(target, &dialog);
-        changeCurrentRow(box_, target->alias);
-    }
+    changeByDialog<EditAliasEntry>(this, box_, &targets_.head, text, &EditAlias::Read, shown);
 }
 
 void EditAlias::Modify() { Selected(currentText(box_)); }

@@ -27,26 +27,14 @@ void MailAlias::loadValues() {}
 void MailAlias::storeValues() {}
 
 void MailAlias::MailAliasAdd() {
-    EditAlias dialog{this, "Edit", nullptr};
-    if (dialog.exec() == QDialog::Accepted) {
-        alias_entry alias;
-        MailAliasRead(&alias, &dialog);
-        addShown(aliases_, &alias_list.head, std::move(alias), shown);
-    }
+    addByDialog<EditAlias>(this, aliases_, &alias_list.head, &MailAlias::MailAliasRead, shown);
 }
 
 void MailAlias::MailAliasRemove() { removeCurrent(aliases_, &alias_list.head, shown); }
 
 void MailAlias::MailAliasSelected(const char *address) {
-    alias_entry *alias = recordShown(alias_list.head, address, shown);
-    if (alias == nullptr) {
-        return;
-    }
-    EditAlias dialog{this, "edit", alias};
-    if (dialog.exec() == QDialog::Accepted) {
-        MailAliasRead(alias, &dialog);
-        changeCurrentRow(aliases_, alias->address);
-    }
+    changeByDialog<EditAlias>(this, aliases_, &alias_list.head, address, &MailAlias::MailAliasRead,
+                              shown);
 }
 
 void MailAlias::MailAliasModify() { MailAliasSelected(currentText(aliases_)); }

@@ -50,26 +50,14 @@ void MailFetch::storeValues() {
 }
 
 void MailFetch::MailFetchAdd() {
-    EditFetch dialog{this, "Edit", nullptr};
-    if (dialog.exec() == QDialog::Accepted) {
-        pop_host host;
-        MailFetchRead(&host, &dialog);
-        addShown(fetchers_, &pop_host_list.head, host, shown);
-    }
+    addByDialog<EditFetch>(this, fetchers_, &pop_host_list.head, &MailFetch::MailFetchRead, shown);
 }
 
 void MailFetch::MailFetchRemove() { removeCurrent(fetchers_, &pop_host_list.head, shown); }
 
 void MailFetch::MailFetchSelected(const char *user) {
-    pop_host *host = recordShown(pop_host_list.head, user, shown);
-    if (host == nullptr) {
-        return;
-    }
-    EditFetch dialog{this, "edit", host};
-    if (dialog.exec() == QDialog::Accepted) {
-        MailFetchRead(host, &dialog);
-        changeCurrentRow(fetchers_, shown(*host));
-    }
+    changeByDialog<EditFetch>(this, fetchers_, &pop_host_list.head, user, &MailFetch::MailFetchRead,
+                              shown);
 }
 
 void MailFetch::MailFetchModify() { MailFetchSelected(currentText(fetchers_)); }

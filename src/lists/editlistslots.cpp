@@ -31,6 +31,10 @@ std::optional<int> nextRowHolding(const QListBox *box, const std::string &needle
     return std::nullopt;
 }
 
+void readMember(EditList * /*editor*/, maillist_addr_entry *entry, EditListMember *dialog) {
+    entry->addr = dialog->addr();
+}
+
 } // namespace
 
 void EditList::MemberAdd() { AddMember(members_.box, &members_.chain.head); }
@@ -76,19 +80,11 @@ void EditList::BlockSearch() { Search(blocked_.box, &blocked_.chain.head); }
 void EditList::BlockLoad() { Load(blocked_.box, &blocked_.chain.head); }
 
 void EditList::Add(QListBox *box, maillist_addr_entry **chain) {
-    EditListAddr dialog{this, "Edit", nullptr};
-    if (dialog.exec() == QDialog::Accepted) {
-        maillist_addr_entry entry;
-        Read(&entry, &dialog);
-        addShown(box, chain, std::move(entry), addressStored);
-    }
+    addByDialog<EditListAddr>(this, box, chain, &EditList::Read, addressStored);
 }
 
 void EditList::AddMember(QListBox *box, maillist_addr_entry **chain) {
-    EditListMember dialog{this, "Edit", nullptr};
-    if (dialog.exec() == QDialog::Accepted) {
-        addShown(box, chain, maillist_addr_entry{dialog.addr()}, addressShown);
-    }
+    addByDialog<EditListMember>(this, box, chain, readMember, addressShown);
 }
 
 void EditList::Remove(QListBox *box, maillist_addr_entry **chain) {
@@ -96,27 +92,11 @@ void EditList::Remove(QListBox *box, maillist_addr_entry **chain) {
 }
 
 void EditList::Selected(QListBox *box, maillist_addr_entry **chain, const char *text) {
-    maillist_addr_entry *entry = recordShown(*chain, text, addressStored);
-    if (entry == nullptr) {
-        return;
-    }
-    EditListAddr dialog{this, "edit", entry};
-    if (dialog.exec() == QDialog::Accepted) {
-        Read(entry, &dialog);
-        changeCurrentRow(box, entry->addr);
-    }
+    changeByDialog<EditListAddr>(this, box, chain, text, &EditList::Read, addressStored);
 }
 
 void EditList::SelectedMember(QListBox *box, maillist_addr_entry **chain, const char *text) {
-    maillist_addr_entry *entry = recordShown(*chain, text, addressShown);
-    if (entry == nullptr) {
-        return;
-    }
-    EditListMember dialog{this, "edit", entry};
-    if (dialog.exec() == QDialog::Accepted) {
-        entry->addr = dialog.addr();
-        changeCurrentRow(box, addressShown(*entry));
-    }
+    changeByDialog<EditListMember>(this, box, chain, text, readMember, addressShown);
 }
 
 void EditList::Search(QListBox *box, maillist_addr_entry ** /*chain*/) {

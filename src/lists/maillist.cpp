@@ -27,26 +27,14 @@ void MailList::loadValues() {}
 void MailList::storeValues() {}
 
 void MailList::MailListAdd() {
-    EditList editor{this, "Edit", nullptr};
-    if (editor.exec() == QDialog::Accepted) {
-        maillist_entry record;
-        MailListRead(&record, &editor);
-        addShown(lists_, &maillist_list.head, std::move(record), shown);
-    }
+    addByDialog<EditList>(this, lists_, &maillist_list.head, &MailList::MailListRead, shown);
 }
 
 void MailList::MailListRemove() { removeCurrent(lists_, &maillist_list.head, shown); }
 
 void MailList::MailListSelected(const char *name) {
-    maillist_entry *record = recordShown(maillist_list.head, name, shown);
-    if (record == nullptr) {
-        return;
-    }
-    EditList editor{this, "edit", record};
-    if (editor.exec() == QDialog::Accepted) {
-        MailListRead(record, &editor);
-        changeCurrentRow(lists_, record->name);
-    }
+    changeByDialog<EditList>(this, lists_, &maillist_list.head, name, &MailList::MailListRead,
+                             shown);
 }
 
 void MailList::MailListModify() { MailListSelected(currentText(lists_)); }

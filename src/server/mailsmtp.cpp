@@ -35,26 +35,13 @@ void MailSMTP::loadValues() {}
 void MailSMTP::storeValues() { form_.store(); }
 
 void MailSMTP::Add() {
-    EditSMTP dialog{this, "Edit", nullptr};
-    if (dialog.exec() == QDialog::Accepted) {
-        smtpreject_entry entry;
-        Read(&entry, &dialog);
-        addShown(rejects_, &smtpreject_list.head, std::move(entry), shown);
-    }
+    addByDialog<EditSMTP>(this, rejects_, &smtpreject_list.head, &MailSMTP::Read, shown);
 }
 
 void MailSMTP::Remove() { removeCurrent(rejects_, &smtpreject_list.head, shown); }
 
 void MailSMTP::Selected(const char *text) {
-    smtpreject_entry *entry = recordShown(smtpreject_list.head, text, shown);
-    if (entry == nullptr) {
-        return;
-    }
-    EditSMTP dialog{this, "edit", entry};
-    if (dialog.exec() == QDialog::Accepted) {
-        Read(entry, &dialog);
-        changeCurrentRow(rejects_, entry->domain);
-    }
+    changeByDialog<EditSMTP>(this, rejects_, &smtpreject_list.head, text, &MailSMTP::Read, shown);
 }
 
 void MailSMTP::Modify() { Selected(currentText(rejects_)); }

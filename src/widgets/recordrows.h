@@ -3,6 +3,9 @@
 #include "base/recordlist.h"
 #include "platform/qlistbox.h"
 
+#include <QDialog>
+
+#include <functional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -65,5 +68,33 @@ void removeCurrent(QListBox *box, Record **head, Shown shown) {
     if (row && link != nullptr) {
         box->remove(*row);
         removeRecord(link);
+    }
+}
+
+/// Asks in a `Dialog` named "Edit" for a new record and adds it, unless that is cancelled.
+/// `read(owner, &record, &dialog)` takes the input over; a slot of the owner will do.
+template <class Dialog, class Owner, class Record, class Read, class Shown>
+void addByDialog(Owner *owner, QListBox *box, Record **head, Read read, Shown shown) {
+    Dialog dialog{owner, "Edit", nullptr};
+    if (dialog.exec() == QDialog::Accepted) {
+        Record record;
+        std::invoke(read, owner, &record, &dialog);
+        addShown(box, head, std::move(record), shown);
+    }
+}
+
+/// Changes the record that shows `text` in a `Dialog` named "edit", and the current row with it.
+/// Nothing happens when there is no such record, or the dialog is cancelled.
+template <class Dialog, class Owner, class Record, class Read, class Shown>
+void changeByDialog(Owner *owner, QListBox *box, Record **head, const char *text, Read read,
+                    Shown shown) {
+    Record *record = recordShown(*head, text, shown);
+    if (record == nullptr) {
+        return;
+    }
+    Dialog dialog{owner, "edit", record};
+    if (dialog.exec() == QDialog::Accepted) {
+        std::invoke(read, owner, record, &dialog);
+        changeCurrentRow(box, shown(*record));
     }
 }
