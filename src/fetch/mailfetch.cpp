@@ -5,6 +5,7 @@
 #include "fetch/pophosts.h"
 #include "platform/knumericspinbox.h"
 #include "widgets/listgroup.h"
+#include "widgets/numberfield.h"
 #include "widgets/pagelayout.h"
 #include "widgets/recordrows.h"
 
@@ -20,17 +21,14 @@ std::string_view shown(const pop_host &host) { return popHostText(host.user); }
 } // namespace
 
 MailFetch::MailFetch(QWidget *parent, const char *name)
-    : KConfigWidget(parent, name), pollTime_{new KNumericSpinBox} {
+    : KConfigWidget(parent, name),
+      pollTime_{newNumberField(nullptr, 0, 999, settings().pop_time.value)} {
     auto *group = new ListGroup("POP3 Mail Fetchers", {600, columnWidth}, this);
     fetchers_ = group->box();
     appendRows(fetchers_, pop_host_list, shown);
     group->addEditButtons(this, &MailFetch::MailFetchAdd, &MailFetch::MailFetchModify,
                           &MailFetch::MailFetchRemove, &MailFetch::MailFetchSelected);
 
-    pollTime_->setRange(0, 999);
-    pollTime_->setStep(1);
-    pollTime_->setEditable(true);
-    pollTime_->setValue(settings().pop_time.value);
     auto *label = new QLabel(QStringLiteral("Poll time (s):"));
     label->setBuddy(pollTime_);
     QVBoxLayout *column = group->column();

@@ -3,6 +3,7 @@
 #include "platform/knumericspinbox.h"
 #include "widgets/fieldtext.h"
 #include "widgets/listgroup.h"
+#include "widgets/numberfield.h"
 #include "widgets/pagelayout.h"
 #include "widgets/recordrows.h"
 
@@ -20,7 +21,6 @@ namespace {
 constexpr int highestTrigger = 1024;
 constexpr int buttonWidth = 60;
 constexpr int labelHeight = 20;
-constexpr int spinBoxWidth = 60;
 constexpr int checkBoxHeight = 20;
 constexpr int buttonHeight = 22;
 /// What the rows shrink to in a window that is lower than they need: the text stays whole.
@@ -135,7 +135,7 @@ QGroupBox *EditList::newTextFields(const maillist_entry &list) {
 template <std::size_t count>
 void EditList::addTextFields(QVBoxLayout *rows, int labelWidth,
                              const std::array<TextRow, count> &fields, const maillist_entry &list) {
-    QSize label{labelWidth, labelHeight};
+    QSize label{labelWidth, leastFieldHeight};
     for (const TextRow &text : fields) {
         label = widened(label, {translated(text.caption)});
     }
@@ -179,12 +179,7 @@ QGroupBox *EditList::newOptions(const maillist_entry &list) {
 
 void EditList::addTrigger(QBoxLayout *rows, QLabel *caption, const Unit &unit,
                           std::int32_t maillist_entry::*field, const maillist_entry &list) {
-    auto *box = new KNumericSpinBox(this);
-    box->setRange(0, highestTrigger);
-    box->setStep(1);
-    box->setEditable(true);
-    box->setValue(list.*field);
-    box->setFixedWidth(spinBoxWidth);
+    KNumericSpinBox *box = newNumberField(this, 0, highestTrigger, list.*field);
     QLabel *unitLabel = newLabel(QString::fromUtf8(unit.caption), {unit.width, labelHeight}, this);
     caption->setBuddy(box);
     unitLabel->setBuddy(box);

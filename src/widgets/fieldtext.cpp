@@ -28,6 +28,7 @@ void showBytes(QLineEdit *field, std::string_view bytes) {
     field->setText(textFromBytes(bytes.substr(0, isTooLong ? bytesShownOfLonger : bytes.size())));
     field->setCursorPosition(0);
     field->setReadOnly(isTooLong);
+    field->setProperty(wholeText, {}); // Of a longer text that was shown before.
     if (isTooLong) {
         field->setProperty(wholeText,
                            QByteArray(bytes.data(), static_cast<qsizetype>(bytes.size())));

@@ -3,18 +3,13 @@
 #include "platform/knumericspinbox.h"
 #include "widgets/captions.h"
 #include "widgets/fieldtext.h"
+#include "widgets/numberfield.h"
 #include "widgets/pagelayout.h"
 
 #include <QCheckBox>
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QLineEdit>
-
-namespace {
-
-constexpr int spinBoxWidth = 60;
-
-} // namespace
 
 SettingsForm::SettingsForm(QWidget *page, int labelWidth)
     : pageLayout_{newPageLayout(page)}, labelWidth_{labelWidth} {}
@@ -36,12 +31,7 @@ void SettingsForm::checkBox(const char *caption, BoolSetting &setting) {
 
 void SettingsForm::number(const char *caption, int lowest, int highest, NumberSetting &setting,
                           const char *note) {
-    auto *box = new KNumericSpinBox(group_);
-    box->setRange(lowest, highest);
-    box->setStep(1);
-    box->setEditable(true);
-    box->setValue(setting.value);
-    box->setFixedWidth(spinBoxWidth);
+    KNumericSpinBox *box = newNumberField(group_, lowest, highest, setting.value);
     QHBoxLayout *row = newRow(caption, box);
     if (note != nullptr) {
         row->addWidget(new QLabel(QString::fromUtf8(note), group_));
