@@ -21,7 +21,7 @@ alias_list_entry copyOf(const alias_list_entry &target) {
 EditAlias::EditAlias(QWidget *parent, const char *name, const alias_entry *alias)
     : FormDialog(parent, name, "Email Address Aliasing") {
     address_ =
-        addField("&Address:", {70, 18}, alias != nullptr ? std::string_view{alias->address} : "");
+        addField(translatable("&Address:"), {70, 18}, alias != nullptr ? std::string_view{alias->address} : "");
     applyRule(address_, oneWordRule());
 
     auto *group = new ListGroup("Aliases", {250, 70}, this);
@@ -34,8 +34,8 @@ EditAlias::EditAlias(QWidget *parent, const char *name, const alias_entry *alias
         targets_ = alias->aliases.copied(copyOf);
         appendRows(box_, targets_, shown);
     }
+    addButtons(5, 15);
     fixSize({350, 210}, {348, 180});
-    addButtonRow();
 }
 
 std::string EditAlias::address() const { return fieldBytes(address_); }

@@ -5,7 +5,6 @@
 #include "widgets/fieldtext.h"
 
 #include <QComboBox>
-#include <QFileDialog>
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QLineEdit>
@@ -40,29 +39,28 @@ int entryShownFor(std::uint8_t type) {
 } // namespace
 
 EditAliasEntry::EditAliasEntry(QWidget *parent, const char *name, const alias_list_entry *target)
-    : FormDialog(parent, name, "Address Alias"), type_{new QComboBox} {
+    : FormDialog(parent, name, "Address Alias"), type_{new QComboBox(this)} {
     QHBoxLayout *aliasRow = addRow();
-    alias_ = addField(aliasRow, "&Alias:", {40, 18},
+    CaptionColumn aliasCaption{{40, 18}};
+    alias_ = addField(aliasRow, translatable("&Alias:"), aliasCaption,
                       target != nullptr ? std::string_view{target->alias} : "");
     applyRule(alias_, oneWordRule());
-    connect(addBrowseButton(aliasRow, 70, this), &QPushButton::clicked, this,
+    connect(addBrowseButton(aliasRow, 70, translatable("&Alias:")), &QPushButton::clicked, this,
             &EditAliasEntry::browse);
 
     type_->setObjectName("Alias Type");
-    type_->setFixedHeight(fieldHeight);
     for (const TypeEntry &entry : typeEntries) {
         type_->addItem(QString::fromUtf8(entry.caption));
     }
     type_->setCurrentIndex(target != nullptr ? entryShownFor(target->type) : 0);
-    QLabel *label = newLabel(QStringLiteral("Alias Type:"), {70, fieldHeight}, this);
-    label->setBuddy(type_);
     QHBoxLayout *typeRow = addRow();
-    typeRow->addWidget(label);
-    typeRow->addWidget(type_);
+    CaptionColumn typeCaption{{70, fieldHeight}};
+    typeRow->addWidget(typeCaption.newCaption(QStringLiteral("Alias Type:"), type_));
+    addAsField(typeRow, type_);
     typeRow->addStretch();
 
+    addButtons(5, 10);
     fixSize({350, 100}, {348, 80});
-    addButtonRow();
 }
 
 void EditAliasEntry::store(alias_list_entry &target) const {
@@ -71,9 +69,4 @@ void EditAliasEntry::store(alias_list_entry &target) const {
     target.type = entry.type.value_or(target.type);
 }
 
-void EditAliasEntry::browse() {
-    const QString directory = QFileDialog::getExistingDirectory(this, {}, alias_->text());
-    if (isWholePath(directory)) {
-        replaceByRule(alias_, directory);
-    }
-}
+void EditAliasEntry::browse() { browseForDirectory(alias_, this); }

@@ -2,6 +2,7 @@
 
 #include "alias/aliasfile.h"
 #include "alias/mailalias.h"
+#include "base/textfile.h"
 #include "config/masterfile.h"
 #include "config/productpaths.h"
 #include "config/settings.h"
@@ -58,6 +59,10 @@ KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
     createPage(delivery_, "debatch", "&Delivery", "tarvex-mail-delivery.html");
     createPage(alias_, "alias", "&Aliasing", "tarvex-mail-alias.html");
     createPage(lists_, "list", "&Mail List", "tarvex-mail-list.html");
+    if (!mayRewrite(productPaths().master)) {
+        setNote(getLocale()->translate(translatable(
+            "Changes cannot be saved: this user may not write the master file.")));
+    }
     showDialog();
 }
 

@@ -113,6 +113,18 @@ bool rewriteFile(const std::string &path, std::string_view bytes) {
     return true;
 }
 
+bool mayRewrite(const std::string &path) {
+    const auto isAllowed = [](const std::string &file, int rights) {
+        return ::faccessat(AT_FDCWD, file.c_str(), rights, AT_EACCESS) == 0;
+    };
+    if (isAllowed(path, W_OK)) {
+        return true;
+    }
+    const std::size_t folderEnd = path.rfind('/');
+    return errno == ENOENT && folderEnd != std::string::npos &&
+           isAllowed(path.substr(0, folderEnd + 1), W_OK | X_OK);
+}
+
 std::optional<std::string_view> LinePieces::next() {
     if (rest_.empty()) {
         return std::nullopt;

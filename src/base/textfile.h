@@ -17,6 +17,10 @@ std::optional<std::string> readWholeFile(const std::string &path);
 /// creates it where it is missing. False when it could not be opened or not be written whole.
 bool rewriteFile(const std::string &path, std::string_view bytes);
 
+/// Whether rewriteFile would get to open the file, as far as the user's rights decide it. Opens
+/// nothing and changes nothing.
+bool mayRewrite(const std::string &path);
+
 /// Cuts bytes into the pieces that the C library's line reading gives: up to and including a line
 /// feed, but at most `longest` bytes, the line feed counted among them. So a line of exactly
 /// `longest` bytes leaves its line feed to the next piece.

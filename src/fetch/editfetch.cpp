@@ -21,14 +21,13 @@ FieldRule ruleFor(std::size_t size) {
 
 EditFetch::EditFetch(QWidget *parent, const char *name, const pop_host *host)
     : FormDialog(parent, name, "POP Fetcher Settings") {
-    const QSize label = widened(
-        {70, 18}, {translated("&Server:"), translated("&Username:"), translated("&Password:")});
+    CaptionColumn captions{{70, 18}};
     const pop_host shown = host != nullptr ? *host : pop_host{};
-    server_ = addField("&Server:", label, popHostText(shown.server));
-    user_ = addField("&Username:", label, popHostText(shown.user));
-    password_ = addField("&Password:", label, popHostText(shown.password));
+    server_ = addField(addRow(), translatable("&Server:"), captions, popHostText(shown.server));
+    user_ = addField(addRow(), translatable("&Username:"), captions, popHostText(shown.user));
+    password_ = addField(addRow(), translatable("&Password:"), captions, popHostText(shown.password));
+    addButtons(pageBorder, 15);
     fixSize({250, 140}, {247, 110});
-    addButtonRow();
 
     applyRule(server_, ruleFor(shown.server.size()));
     applyRule(password_, ruleFor(shown.password.size()));

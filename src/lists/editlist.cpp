@@ -1,6 +1,7 @@
 #include "lists/editlist.h"
 
 #include "platform/knumericspinbox.h"
+#include "platform/lowscreen.h"
 #include "widgets/fieldtext.h"
 #include "widgets/listgroup.h"
 #include "widgets/numberfield.h"
@@ -12,6 +13,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
+#include <QScrollArea>
 
 #include <algorithm>
 #include <array>
@@ -22,12 +24,11 @@ constexpr int highestTrigger = 1024;
 constexpr int buttonWidth = 60;
 constexpr int labelHeight = 20;
 constexpr int checkBoxHeight = 20;
-constexpr int buttonHeight = 22;
-/// What the rows shrink to in a window that is lower than they need: the text stays whole.
-constexpr int leastFieldHeight = 18;
-constexpr int leastCheckBoxHeight = 15;
-constexpr int leastButtonHeight = 16;
+/// What rows keep around their text's height, in pixels, in a window that is too low for all.
+constexpr int aroundFieldText = 4;
+constexpr int aroundCheckBoxText = 1;
 constexpr int leastBoxHeight = 40;
+constexpr QSize leastWindow{600, 350};
 constexpr std::uint32_t newListFlags = MAILLIST_OPEN | MAILLIST_MEMBERS_POST | MAILLIST_REPLY_TO |
                                        MAILLIST_DIGEST | MAILLIST_BLOCK_MIME;
 
@@ -44,46 +45,63 @@ constexpr std::array<Option, 5> options{
      {"Block posts containing MIME attachments", MAILLIST_BLOCK_MIME},
      {"Allow digest subscriptions", MAILLIST_DIGEST}}};
 
+/// A row of its own below those that are there already.
+QHBoxLayout *newRow(QVBoxLayout *rows) {
+    if (rows->count() > 0) {
+        addSpace(rows, groupSpacing, Shrinking::Yes);
+    }
+    auto *row = new QHBoxLayout;
+    row->setSpacing(groupSpacing);
+    rows->addLayout(row);
+    return row;
+}
+
 maillist_addr_entry copyOf(const maillist_addr_entry &entry) { return {entry.addr}; }
 
 } // namespace
 
 const std::array<EditList::TextRow, 5> EditList::addressRows{
-    {{"&Mail list Name:", &maillist_entry::name, nullptr},
-     {"&Posting Address:", &maillist_entry::post, nullptr},
-     {"&Subscribe Address:", &maillist_entry::admin, nullptr},
-     {"&Support Address:", &maillist_entry::support, nullptr},
-     {"&Moderator Address:", &maillist_entry::modrt, nullptr}}};
+    {{translatable("&Mail list Name:"), &maillist_entry::name, nullptr},
+     {translatable("&Posting Address:"), &maillist_entry::post, nullptr},
+     {translatable("&Subscribe Address:"), &maillist_entry::admin, nullptr},
+     {translatable("&Support Address:"), &maillist_entry::support, nullptr},
+     {translatable("&Moderator Address:"), &maillist_entry::modrt, nullptr}}};
 
 const std::array<EditList::TextRow, 3> EditList::fileRows{
-    {{"&Info file:", &maillist_entry::info, &EditList::browseInfo},
-     {"&Header file:", &maillist_entry::header, &EditList::browseHeader},
-     {"&Footer file:", &maillist_entry::footer, &EditList::browseFooter}}};
+    {{translatable("&Info file:"), &maillist_entry::info, &EditList::browseInfo},
+     {translatable("&Header file:"), &maillist_entry::header, &EditList::browseHeader},
+     {translatable("&Footer file:"), &maillist_entry::footer, &EditList::browseFooter}}};
 
 EditList::EditList(QWidget *parent, const char *name, const maillist_entry *list)
-    : FormDialog(parent, name, "Mailing List") {
+    : FormDialog(parent, name, "Mailing List", aroundFieldText) {
     maillist_entry newList;
     newList.flags = newListFlags;
     const maillist_entry &shown = list != nullptr ? *list : newList;
 
+    auto *columns = new QWidget(this);
+    auto *sides = new QHBoxLayout(columns);
     auto *left = new QVBoxLayout;
     auto *right = new QVBoxLayout;
-    QHBoxLayout *columns = addRow();
+    sides->setContentsMargins(0, 0, 0, 0);
+    sides->setSpacing(groupSpacing);
+    sides->addLayout(left, 150);
+    sides->addLayout(right, 300);
     left->setSpacing(0);
     right->setSpacing(0);
-    columns->addLayout(left, 150);
-    columns->addLayout(right, 300);
     left->addWidget(newTextFields(shown));
+    addSpace(left, groupSpacing, Shrinking::Yes);
     left->addWidget(newOptions(shown));
     left->addStretch();
     right->addWidget(newAddressGroup("List Members", members_, shown,
                                      {&EditList::MemberAdd, &EditList::MemberModify,
                                       &EditList::MemberRemove, &EditList::MemberSearch,
                                       &EditList::MemberLoad, &EditList::MemberSelected}));
+    addSpace(right, groupSpacing, Shrinking::Yes);
     right->addWidget(
         newAddressGroup("Allowed Posters", allowed_, shown,
                         {&EditList::AllowAdd, &EditList::AllowModify, &EditList::AllowRemove,
                          &EditList::AllowSearch, &EditList::AllowLoad, &EditList::AllowSelected}));
+    addSpace(right, groupSpacing, Shrinking::Yes);
     right->addWidget(
         newAddressGroup("Blocked Posters", blocked_, shown,
                         {&EditList::BlockAdd, &EditList::BlockModify, &EditList::BlockRemove,
@@ -92,41 +110,20 @@ EditList::EditList(QWidget *parent, const char *name, const maillist_entry *list
     appendRows(members_.box, members_.chain, addressShown);
     appendRows(allowed_.box, allowed_.chain, addressStored);
     appendRows(blocked_.box, blocked_.chain, addressStored);
-    addButtonRow();
-    setRowHeights(&RowHeight::full, tightBorder);
-    rowsNeed_ = layout()->minimumSize().height();
-    setMinimumSize(600, 350);
-    resize(sizeHint().width(), rowsNeed_);
-}
 
-void EditList::resizeEvent(QResizeEvent *event) {
-    FormDialog::resizeEvent(event);
-    if (height() < rowsNeed_) {
-        setRowHeights(&RowHeight::least, 0);
-    } else {
-        setRowHeights(&RowHeight::full, tightBorder);
+    rows()->addWidget(columns);
+    addButtons(pageBorder, pageBorder, Shrinking::Yes);
+    const QSize room = roomFor(this);
+    if (!fitsInto(room, layout()->totalMinimumSize())) {
+        rows()->addWidget(scrolling(columns));
     }
-}
-
-void EditList::setRowHeights(int RowHeight::*which, int spacing) {
-    for (QLayout *rows : rowLayouts_) {
-        rows->setSpacing(spacing);
-    }
-    for (const RowHeight &row : rowHeights_) {
-        row.widget->setFixedHeight(row.*which);
-    }
-}
-
-QVBoxLayout *EditList::newRows(QGroupBox *group) {
-    auto *rows = new QVBoxLayout(group);
-    rows->setContentsMargins(tightBorder, tightBorder, tightBorder, tightBorder);
-    rowLayouts_.push_back(rows);
-    return rows;
+    setMinimumSize(leastWindow.expandedTo(layout()->totalMinimumSize()).boundedTo(room));
+    resize(layout()->totalSizeHint().boundedTo(room));
 }
 
 QGroupBox *EditList::newTextFields(const maillist_entry &list) {
     auto *group = new QGroupBox(QStringLiteral("List Addresses"), this);
-    QVBoxLayout *rows = newRows(group);
+    QVBoxLayout *rows = newGroupRows(group, Shrinking::Yes);
     addTextFields(rows, 110, addressRows, list);
     addTextFields(rows, 65, fileRows, list);
     return group;
@@ -135,20 +132,13 @@ QGroupBox *EditList::newTextFields(const maillist_entry &list) {
 template <std::size_t count>
 void EditList::addTextFields(QVBoxLayout *rows, int labelWidth,
                              const std::array<TextRow, count> &fields, const maillist_entry &list) {
-    QSize label{labelWidth, leastFieldHeight};
-    for (const TextRow &text : fields) {
-        label = widened(label, {translated(text.caption)});
-    }
+    CaptionColumn captions{{labelWidth, 0}};
     for (const auto &[caption, field, browse] : fields) {
-        auto *row = new QHBoxLayout;
-        rows->addLayout(row);
-        QLineEdit *edit = addField(row, caption, label, list.*field);
-        texts_.push_back({edit, field});
-        rowHeights_.push_back({edit, fieldHeight, leastFieldHeight});
+        QHBoxLayout *row = newRow(rows);
+        texts_.push_back({addField(row, caption, captions, list.*field), field});
         if (browse != nullptr) {
-            QPushButton *button = addBrowseButton(row, buttonWidth, this);
-            connect(button, &QPushButton::clicked, this, browse);
-            rowHeights_.push_back({button, fieldHeight, leastFieldHeight});
+            connect(addBrowseButton(row, buttonWidth, caption), &QPushButton::clicked, this,
+                    browse);
         }
     }
 }
@@ -159,53 +149,45 @@ QLineEdit *EditList::fieldOf(std::string maillist_entry::*field) const {
 
 QGroupBox *EditList::newOptions(const maillist_entry &list) {
     auto *group = new QGroupBox(QStringLiteral("Posting Options"), this);
-    QVBoxLayout *rows = newRows(group);
+    QVBoxLayout *rows = newGroupRows(group, Shrinking::Yes);
     for (const auto &[caption, bit] : options) {
         auto *box = new QCheckBox(QString::fromUtf8(caption), group);
         box->setChecked((list.flags & bit) != 0);
-        rows->addWidget(box);
+        addOfHeight(newRow(rows), box, checkBoxHeight, aroundCheckBoxText);
         options_.push_back({box, bit});
-        rowHeights_.push_back({box, checkBoxHeight, leastCheckBoxHeight});
     }
-    const QString sizeTrigger = QStringLiteral("Digest size trigger:");
-    const QString countTrigger = QStringLiteral("Digest count trigger:");
-    const QSize label = widened({120, labelHeight}, {sizeTrigger, countTrigger});
-    addTrigger(rows, newLabel(sizeTrigger, label, this), {" kB", 30}, &maillist_entry::diglen,
-               list);
-    addTrigger(rows, newLabel(countTrigger, label, this), {" messages", 100},
+    CaptionColumn captions{{120, labelHeight}};
+    addTrigger(newRow(rows), "Digest size trigger:", captions, {" kB", 30},
+               &maillist_entry::diglen, list);
+    addTrigger(newRow(rows), "Digest count trigger:", captions, {" messages", 100},
                &maillist_entry::digno, list);
     return group;
 }
 
-void EditList::addTrigger(QBoxLayout *rows, QLabel *caption, const Unit &unit,
-                          std::int32_t maillist_entry::*field, const maillist_entry &list) {
+void EditList::addTrigger(QHBoxLayout *row, const char *caption, CaptionColumn &captions,
+                          const Unit &unit, std::int32_t maillist_entry::*field,
+                          const maillist_entry &list) {
     KNumericSpinBox *box = newNumberField(this, 0, highestTrigger, list.*field);
+    row->addWidget(captions.newCaption(QString::fromUtf8(caption), box));
+    addAsField(row, box);
     QLabel *unitLabel = newLabel(QString::fromUtf8(unit.caption), {unit.width, labelHeight}, this);
-    caption->setBuddy(box);
     unitLabel->setBuddy(box);
-    auto *row = new QHBoxLayout;
-    row->addWidget(caption);
-    row->addWidget(box);
     row->addWidget(unitLabel);
     row->addStretch();
-    rows->addLayout(row);
     triggers_.push_back({box, field});
-    rowHeights_.push_back({box, fieldHeight, leastFieldHeight});
 }
 
 ListGroup *EditList::newAddressGroup(const char *caption, Addresses &addresses,
                                      const maillist_entry &list, const AddressSlots &slotsOf) {
-    auto *group = new ListGroup(caption, {1000, 0}, this);
-    group->makeTight();
+    auto *group = new ListGroup(caption, {1000, 0}, this, Shrinking::Yes);
     group->box()->setMinimumHeight(leastBoxHeight);
+    // The box takes what height there is; only the buttons beside it ask for some.
+    group->box()->setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Ignored);
     group->addEditButtons(this, slotsOf.add, slotsOf.modify, slotsOf.remove, slotsOf.selected);
     connect(group->addButton("Search..."), &QPushButton::clicked, this, slotsOf.search);
     connect(group->addButton("Load File"), &QPushButton::clicked, this, slotsOf.load);
     group->fixColumnWidth(buttonWidth);
     group->column()->addStretch();
-    for (QPushButton *button : group->findChildren<QPushButton *>()) {
-        rowHeights_.push_back({button, buttonHeight, leastButtonHeight});
-    }
     addresses.box = group->box();
     addresses.chain = (list.*addresses.field).copied(copyOf);
     return group;

@@ -9,7 +9,6 @@
 class EditListAddr;
 class KNumericSpinBox;
 class ListGroup;
-class QBoxLayout;
 class QCheckBox;
 class QGroupBox;
 class QListBox;
@@ -58,9 +57,6 @@ public slots:
     void browseHeader();
     void browseFooter();
 
-protected:
-    void resizeEvent(QResizeEvent *event) override;
-
 private:
     /// One address list: the working copy and the box that shows it.
     struct Addresses {
@@ -87,21 +83,12 @@ private:
         int width;
     };
 
-    /// A widget's height, and the one it has where the window is too low for all rows.
-    struct RowHeight {
-        QWidget *widget;
-        int full;
-        int least;
-    };
-    void setRowHeights(int RowHeight::*which, int spacing);
-    QVBoxLayout *newRows(QGroupBox *group);
-
     using Slot = void (EditList::*)();
 
     /// A text of the list, the caption of its field, and what "Browse..." behind it does, if it
     /// stands there.
     struct TextRow {
-        const char *caption;
+        TranslatableText caption;
         std::string maillist_entry::*field;
         Slot browse;
     };
@@ -125,17 +112,15 @@ private:
                        const maillist_entry &list);
     [[nodiscard]] QLineEdit *fieldOf(std::string maillist_entry::*field) const;
     QGroupBox *newOptions(const maillist_entry &list);
-    void addTrigger(QBoxLayout *rows, QLabel *caption, const Unit &unit,
-                    std::int32_t maillist_entry::*field, const maillist_entry &list);
+    void addTrigger(QHBoxLayout *row, const char *caption, CaptionColumn &captions,
+                    const Unit &unit, std::int32_t maillist_entry::*field,
+                    const maillist_entry &list);
     ListGroup *newAddressGroup(const char *caption, Addresses &addresses,
                                const maillist_entry &list, const AddressSlots &slotsOf);
 
     std::vector<TextField> texts_;
     std::vector<OptionBox> options_;
     std::vector<NumberField> triggers_;
-    std::vector<RowHeight> rowHeights_;
-    std::vector<QLayout *> rowLayouts_; ///< Those whose rows stand closer in a low window.
-    int rowsNeed_ = 0; ///< The height in pixels in which all rows have their full height.
     Addresses members_{&maillist_entry::member, {}};
     Addresses allowed_{&maillist_entry::allow, {}};
     Addresses blocked_{&maillist_entry::block, {}};

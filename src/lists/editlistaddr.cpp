@@ -6,10 +6,10 @@
 
 EditListAddr::EditListAddr(QWidget *parent, const char *name, const maillist_addr_entry *entry)
     : FormDialog(parent, name, "Mail List Address"),
-      email_{addField("&Email:", listDialogLabel,
+      email_{addField(translatable("&Email:"), listDialogLabel,
                       entry != nullptr ? std::string_view{entry->addr} : "")} {
+    addButtons(listDialogBorder, 20);
     fixSize(listDialogSize, listDialogSize);
-    addButtonRow();
 }
 
 std::string EditListAddr::email() const { return fieldBytes(email_); }

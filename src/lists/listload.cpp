@@ -9,10 +9,12 @@
 ListLoad::ListLoad(QWidget *parent, const char *name)
     : FormDialog(parent, name, "Load addresses from file") {
     QHBoxLayout *row = addRow();
-    fileName_ = addField(row, "&Filename:", listDialogLabel, {});
-    connect(addBrowseButton(row, 70, this), &QPushButton::clicked, this, &ListLoad::browse);
+    CaptionColumn captions{listDialogLabel};
+    fileName_ = addField(row, translatable("&Filename:"), captions, {});
+    connect(addBrowseButton(row, 70, translatable("&Filename:")), &QPushButton::clicked, this,
+            &ListLoad::browse);
+    addButtons(listDialogBorder, 20);
     fixSize(listDialogSize, listDialogSize);
-    addButtonRow();
 }
 
 std::string ListLoad::fileName() const { return fieldBytes(fileName_); }

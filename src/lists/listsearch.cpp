@@ -5,9 +5,9 @@
 
 ListSearch::ListSearch(QWidget *parent, const char *name)
     : FormDialog(parent, name, "Mail List Search"),
-      text_{addField("&Search for:", listDialogLabel, {})} {
+      text_{addField(translatable("&Search for:"), listDialogLabel, {})} {
+    addButtons(listDialogBorder, 20);
     fixSize(listDialogSize, listDialogSize);
-    addButtonRow();
 }
 
 std::string ListSearch::text() const { return fieldBytes(text_); }

@@ -1,5 +1,6 @@
 #include "platform/helpwindow.h"
 
+#include <QCoreApplication>
 #include <QFileInfo>
 #include <QLocale>
 #include <QPushButton>
@@ -8,12 +9,13 @@
 
 namespace {
 
+/// None for a path that no folder has, or that is no plain file name.
 QString firstInstalled(const QString &folder, const QString &file) {
     QStringList languages = QLocale::system().uiLanguages();
     languages.append(QStringLiteral("en"));
     for (QString language : languages) {
         QString path = folder + '/' + language.replace('-', '_') + '/' + file;
-        if (QFileInfo(path).isReadable()) {
+        if (QFileInfo(path).isFile() && QFileInfo(path).isReadable()) {
             return path;
         }
     }
@@ -22,27 +24,47 @@ QString firstInstalled(const QString &folder, const QString &file) {
 
 } // namespace
 
-HelpWindow::HelpWindow(QWidget *parent) : QDialog(parent), browser_{new QTextBrowser(this)} {
-    setWindowTitle(tr("Help"));
+HelpWindow::HelpWindow(QString folder)
+    : folder_{std::move(folder)}, browser_{new QTextBrowser(this)} {
+    const QString help = QCoreApplication::translate("QPlatformTheme", "Help");
+    setWindowTitle(help);
     resize(640, 560);
-    auto *close = new QPushButton(tr("Close"), this);
+    browser_->setAccessibleName(help);
+    browser_->setOpenLinks(false);
+    auto *close = new QPushButton(QCoreApplication::translate("QPlatformTheme", "Close"), this);
     close->setDefault(true);
     auto *layout = new QVBoxLayout(this);
     layout->addWidget(browser_);
     layout->addWidget(close, 0, Qt::AlignRight);
     connect(close, &QPushButton::clicked, this, &QDialog::hide);
+    connect(browser_, &QTextBrowser::anchorClicked, this, &HelpWindow::follow);
+    connect(browser_, &QTextBrowser::sourceChanged, this,
+            [this] { setWindowTitle(browser_->documentTitle()); });
 }
 
-void HelpWindow::showFile(const QString &folder, const QString &file) {
-    const QString path = firstInstalled(folder, file);
+void HelpWindow::showFile(const QString &file) {
+    const QString path = firstInstalled(folder_, file);
     if (path.isEmpty()) {
+        setWindowTitle(browser_->accessibleName());
         browser_->setPlainText(QStringLiteral("The help file \"%1\" is not installed.\n\n"
                                               "It was looked for in the folders below %2.")
-                                   .arg(file, folder));
+                                   .arg(file, folder_));
     } else {
         browser_->setSource(QUrl::fromLocalFile(path));
     }
     show();
     raise();
     activateWindow();
+}
+
+void HelpWindow::follow(const QUrl &link) {
+    const QString file = link.fileName();
+    const bool isBeside = link.adjusted(QUrl::RemoveFilename | QUrl::RemoveFragment) ==
+                          browser_->source().adjusted(QUrl::RemoveFilename | QUrl::RemoveFragment);
+    const QString path = firstInstalled(folder_, file);
+    if (isBeside && !file.isEmpty() && !path.isEmpty()) {
+        QUrl target = QUrl::fromLocalFile(path);
+        target.setFragment(link.fragment());
+        browser_->setSource(target);
+    }
 }

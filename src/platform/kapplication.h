@@ -6,12 +6,32 @@
 #include <string>
 
 class QCoreApplication;
+class QTranslator;
+
+/// A text that is shown in the user's language: the literal is marked where it stands, so that the
+/// tool that collects the messages finds it.
+class TranslatableText {
+public:
+    [[nodiscard]] const char *literal() const { return literal_; }
+
+private:
+    explicit constexpr TranslatableText(const char *literal) : literal_{literal} {}
+    friend constexpr TranslatableText translatable(const char *literal);
+
+    const char *literal_;
+};
+
+/// The mark. `literal` must be a string literal.
+constexpr TranslatableText translatable(const char *literal) { return TranslatableText{literal}; }
 
 /// The language of the user's messages.
 class KLocale {
 public:
     /// The text in the user's language, or the text itself where no translation is installed.
     [[nodiscard]] QString translate(const char *text) const;
+    [[nodiscard]] QString translate(TranslatableText text) const {
+        return translate(text.literal());
+    }
 
     /// Finds the messages of the text domain `name` in `directory`.
     void open(const QString &name, const QString &directory);
@@ -25,7 +45,8 @@ private:
 class KApplication {
 public:
     /// Without a display (`hasDisplay` false) there are no widgets, but the locale and the paths
-    /// are the same. `name` is the application's name and its text domain.
+    /// are the same. `name` is the application's name and its text domain. A display that cannot be
+    /// opened ends the process with 1 and one line on standard error.
     KApplication(const char *program, const char *name, bool hasDisplay);
     KApplication(const KApplication &) = delete;
     KApplication &operator=(const KApplication &) = delete;
@@ -33,9 +54,9 @@ public:
 
     static KLocale *getLocale();
 
-    /// The folder `name` among what is installed beside the program (share/...). It is found from
-    /// the program's own place, so that a build tree works like an installation.
-    static QString sharedFolder(const QString &name);
+    /// The folder or file `name` among what is installed beside the program (share/...). It is found
+    /// from the program's own place, so that a build tree works like an installation.
+    static QString shared(const QString &name);
 
     /// The name that the application was made with.
     [[nodiscard]] QString name() const;
@@ -45,4 +66,5 @@ private:
     int toolkitArgumentCount_ = 1;
     char *toolkitArguments_[2];
     std::unique_ptr<QCoreApplication> toolkit_;
+    std::unique_ptr<QTranslator> toolkitTexts_; ///< Null in the toolkit's own language.
 };

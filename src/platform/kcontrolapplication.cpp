@@ -4,6 +4,8 @@
 #include "platform/kcontroldialog.h"
 
 #include <QApplication>
+#include <QCommandLineParser>
+#include <QFile>
 
 #include <algorithm>
 #include <cstdio>
@@ -11,37 +13,13 @@
 
 namespace {
 
-std::string joined(const std::vector<const char *> &names) {
-    std::string text;
-    for (const char *name : names) {
-        text += (text.empty() ? "" : ", ") + std::string{name};
-    }
-    return text;
-}
-
-bool isOption(const std::string &argument, const char *option) {
-    return argument == std::string{"-"} + option || argument == std::string{"--"} + option;
-}
-
-[[noreturn]] void printHelp(const char *name, const std::vector<const char *> &pageNames) {
-    std::printf("Usage: %s [-init] [PAGE]...\n\n"
-                "  -init      read the files, show nothing, end\n"
-                "  --help     print this text\n"
-                "  --version  print the version\n\n"
-                "Without PAGE all pages are shown. Pages: %s\n",
-                name, joined(pageNames).c_str());
+[[noreturn]] void print(const QString &text) {
+    std::fputs(qPrintable(text), stdout);
     std::exit(0);
 }
 
-[[noreturn]] void printVersion(const char *name) {
-    std::printf("%s %s\n", name, TARVEX_VERSION);
-    std::exit(0);
-}
-
-[[noreturn]] void refusePage(const char *name, const std::string &page,
-                             const std::vector<const char *> &pageNames) {
-    std::fprintf(stderr, "%s: unknown page \"%s\"; the pages are %s\n", name, page.c_str(),
-                 joined(pageNames).c_str());
+[[noreturn]] void refuse(const char *name, const QString &problem) {
+    std::fprintf(stderr, "%s: %s\n", name, qPrintable(problem));
     std::exit(2);
 }
 
@@ -50,20 +28,40 @@ bool isOption(const std::string &argument, const char *option) {
 KControlApplication::CommandLine
 KControlApplication::parseCommandLine(int argc, char **argv, const char *name,
                                       const std::vector<const char *> &pageNames) {
-    CommandLine commandLine;
-    for (int index = 1; index < argc; ++index) {
-        const std::string argument = argv[index];
-        if (isOption(argument, "init")) {
-            commandLine.initOnly = true;
-        } else if (argument == "--help") {
-            printHelp(name, pageNames);
-        } else if (argument == "--version") {
-            printVersion(name);
-        } else if (std::ranges::find(pageNames, argument) == pageNames.end()) {
-            refusePage(name, argument, pageNames);
-        } else {
-            commandLine.pages.push_back(argument);
+    QStringList arguments;
+    for (int index = 0; index < argc; ++index) {
+        arguments << QFile::decodeName(argv[index]);
+    }
+    QStringList pages;
+    for (const char *page : pageNames) {
+        pages << QString::fromUtf8(page);
+    }
+    const QCommandLineOption init{"init", "Read the files, show nothing, end."};
+    const QCommandLineOption help{{"h", "help"}, "Print this text."};
+    const QCommandLineOption version{{"v", "version"}, "Print the version."};
+    QCommandLineParser parser;
+    parser.setSingleDashWordOptionMode(QCommandLineParser::ParseAsLongOptions);
+    parser.addOptions({init, help, version});
+    parser.addPositionalArgument("PAGE", "Show these pages alone: " + pages.join(", ") + '.',
+                                 "[PAGE...]");
+    if (!parser.parse(arguments)) {
+        refuse(name, parser.errorText());
+    }
+    if (parser.isSet(help)) {
+        // The text begins with the program's name, which the toolkit asks its application for.
+        const QCoreApplication application{argc, argv};
+        print(parser.helpText());
+    }
+    if (parser.isSet(version)) {
+        print(QStringLiteral("%1 " TARVEX_VERSION "\n").arg(name));
+    }
+    CommandLine commandLine{parser.isSet(init), {}};
+    for (const QString &page : parser.positionalArguments()) {
+        if (!pages.contains(page)) {
+            refuse(name, QStringLiteral("unknown page \"%1\"; the pages are %2")
+                             .arg(page, pages.join(", ")));
         }
+        commandLine.pages.push_back(page.toStdString());
     }
     return commandLine;
 }
@@ -103,7 +101,7 @@ void KControlApplication::applyChanges() {}
 
 void KControlApplication::help() {
     if (dialog_) {
-        dialog_->showHelp(sharedFolder(name() + "/help"));
+        dialog_->showHelp(shared(name() + "/help"));
     }
 }
 
@@ -119,6 +117,8 @@ QWidget *KControlApplication::dialog() const { return dialog_.get(); }
 void KControlApplication::addPage(KConfigWidget *page, const char *label, const char *helpFile) {
     dialog_->addPage(page, QString::fromUtf8(label), QString::fromUtf8(helpFile));
 }
+
+void KControlApplication::setNote(const QString &text) { dialog_->setNote(text); }
 
 void KControlApplication::showDialog() {
     dialog_->addButtons();

@@ -12,10 +12,10 @@ class QWidget;
 /// The application base of a control module: the command line, the tabbed dialog with its buttons,
 /// help and the event loop.
 ///
-/// Command line: "-init" (or "--init") is the init-only mode, which needs no display; "--help" and
-/// "--version" print and end the process with 0. Every other argument names a page; a name that is
-/// none of the application's pages ends the process with 2 and one line on standard error. All this
-/// comes before the toolkit is touched.
+/// Command line: "-init" (or "--init") is the init-only mode, which needs no display; "-h" and "-v"
+/// (or "--help" and "--version") print and end the process with 0. Every other argument names a
+/// page. An unknown option, and a name that is none of the application's pages, end the process
+/// with 2 and one line on standard error. All this comes before a display is looked for.
 class KControlApplication : public KApplication {
 public:
     /// `pageNames` are the names that the command line may ask for.
@@ -43,6 +43,9 @@ protected:
     [[nodiscard]] QWidget *dialog() const;
     /// Adds the page behind the others. `helpFile` is the name of a file in the help folder.
     void addPage(KConfigWidget *page, const char *label, const char *helpFile);
+
+    /// A line that the dialog shows above its buttons; to be called before it is shown.
+    void setNote(const QString &text);
 
     /// Shows the dialog with the pages it has by now.
     void showDialog();

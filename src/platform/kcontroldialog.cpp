@@ -1,21 +1,38 @@
 #include "platform/kcontroldialog.h"
 
 #include "platform/helpwindow.h"
+#include "platform/helpkey.h"
 #include "platform/kconfigwidget.h"
+#include "platform/lowscreen.h"
 
 #include <QApplication>
 #include <QHBoxLayout>
+#include <QLabel>
 #include <QPushButton>
-#include <QShortcut>
+#include <QScrollArea>
+#include <QShortcutEvent>
+#include <QTabBar>
 #include <QTabWidget>
+#include <QVBoxLayout>
 
-KControlDialog::KControlDialog() : tabs_{new QTabWidget(this)} {
+namespace {
+
+/// A caption that the toolkit's own catalogue translates, as it does for its message boxes.
+QString toolkitCaption(const char *caption) {
+    return QCoreApplication::translate("QPlatformTheme", caption);
+}
+
+} // namespace
+
+KControlDialog::KControlDialog() : tabs_{new QTabWidget(this)}, layout_{new QVBoxLayout(this)} {
     // The window is wide enough for all tabs, rather than scrolling them.
     tabs_->setUsesScrollButtons(false);
-    (new QVBoxLayout(this))->addWidget(tabs_);
-    connect(new QShortcut(QKeySequence(Qt::Key_F1), this), &QShortcut::activated, this,
-            &KControlDialog::helpWanted);
+    tabs_->tabBar()->installEventFilter(this);
+    layout_->addWidget(tabs_);
+    addHelpKey(this);
 }
+
+KControlDialog::~KControlDialog() = default;
 
 void KControlDialog::addPage(KConfigWidget *page, const QString &label, const QString &helpFile) {
     tabs_->addTab(page, label);
@@ -23,10 +40,15 @@ void KControlDialog::addPage(KConfigWidget *page, const QString &label, const QS
 }
 
 void KControlDialog::addButtons() {
-    auto *help = new QPushButton(QStringLiteral("Help"), this);
-    auto *ok = new QPushButton(QStringLiteral("OK"), this);
-    auto *apply = new QPushButton(QStringLiteral("Apply"), this);
-    auto *cancel = new QPushButton(QStringLiteral("Cancel"), this);
+    if (!note_.isEmpty()) {
+        auto *note = new QLabel(note_, this);
+        note->setWordWrap(true);
+        layout_->addWidget(note);
+    }
+    auto *help = new QPushButton(toolkitCaption("Help"), this);
+    auto *ok = new QPushButton(toolkitCaption("OK"), this);
+    auto *apply = new QPushButton(toolkitCaption("Apply"), this);
+    auto *cancel = new QPushButton(toolkitCaption("Cancel"), this);
     ok->setDefault(true);
 
     auto *buttons = new QHBoxLayout;
@@ -35,7 +57,7 @@ void KControlDialog::addButtons() {
     buttons->addWidget(ok);
     buttons->addWidget(apply);
     buttons->addWidget(cancel);
-    static_cast<QVBoxLayout *>(layout())->addLayout(buttons);
+    layout_->addLayout(buttons);
 
     connect(help, &QPushButton::clicked, this, &KControlDialog::helpWanted);
     connect(apply, &QPushButton::clicked, this, &KControlDialog::apply);
@@ -44,6 +66,7 @@ void KControlDialog::addButtons() {
         accept();
     });
     connect(cancel, &QPushButton::clicked, this, &QDialog::reject);
+    fitToScreen();
 }
 
 void KControlDialog::showHelp(const QString &folder) {
@@ -51,9 +74,43 @@ void KControlDialog::showHelp(const QString &folder) {
         return;
     }
     if (helpWindow_ == nullptr) {
-        helpWindow_ = new HelpWindow(this);
+        helpWindow_ = std::make_unique<HelpWindow>(folder);
     }
-    helpWindow_->showFile(folder, helpFiles_.at(tabs_->currentIndex()));
+    helpWindow_->showFile(helpFiles_.at(tabs_->currentIndex()));
+}
+
+bool KControlDialog::eventFilter(QObject *watched, QEvent *event) {
+    if (event->type() == QEvent::Shortcut) {
+        if (QWidget *field = fieldOf(static_cast<QShortcutEvent *>(event)->key())) {
+            field->setFocus(Qt::ShortcutFocusReason);
+            return true;
+        }
+    }
+    return QDialog::eventFilter(watched, event);
+}
+
+QWidget *KControlDialog::fieldOf(const QKeySequence &shortcut) const {
+    for (const QLabel *label : tabs_->currentWidget()->findChildren<QLabel *>()) {
+        if (label->buddy() != nullptr && QKeySequence::mnemonic(label->text()) == shortcut) {
+            return label->buddy();
+        }
+    }
+    return nullptr;
+}
+
+void KControlDialog::fitToScreen() {
+    const QSize room = roomFor(this);
+    if (fitsInto(room, layout_->totalMinimumSize())) {
+        return;
+    }
+    tabs_->setUsesScrollButtons(true);
+    const QSize wanted = layout_->totalSizeHint();
+    for (int index = 0; index < tabs_->count(); ++index) {
+        const QString label = tabs_->tabText(index);
+        tabs_->insertTab(index, scrolling(tabs_->widget(index)), label);
+    }
+    tabs_->setCurrentIndex(0);
+    resize(wanted.boundedTo(room));
 }
 
 void KControlDialog::apply() {

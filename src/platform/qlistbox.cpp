@@ -3,9 +3,14 @@
 #include "platform/bytetext.h"
 
 #include <QAbstractListModel>
+#include <QHelpEvent>
 #include <QKeyEvent>
 #include <QMouseEvent>
+#include <QPainter>
+#include <QStyleOption>
+#include <QStyledItemDelegate>
 #include <QTextDocument>
+#include <QToolTip>
 
 #include <algorithm>
 #include <iterator>
@@ -26,7 +31,6 @@ public:
     }
 
     [[nodiscard]] QVariant data(const QModelIndex &index, int role) const override {
-        // The tool tip is for a text that is wider than the list.
         if (!index.isValid() || (role != Qt::DisplayRole && role != Qt::ToolTipRole)) {
             return {};
         }
@@ -65,8 +69,26 @@ private:
     std::vector<std::string> texts_;
 };
 
+/// Rows ask for no width: the list has that of its window, and a longer text ends in dots.
+class QListBox::RowDelegate : public QStyledItemDelegate {
+public:
+    using QStyledItemDelegate::QStyledItemDelegate;
+
+    [[nodiscard]] QSize sizeHint(const QStyleOptionViewItem &option,
+                                 const QModelIndex &index) const override {
+        return {0, QStyledItemDelegate::sizeHint(option, index).height()};
+    }
+
+    [[nodiscard]] int textWidth(const QStyleOptionViewItem &option,
+                                const QModelIndex &index) const {
+        return QStyledItemDelegate::sizeHint(option, index).width();
+    }
+};
+
 QListBox::QListBox(QWidget *parent) : QListView(parent), rows_{new Rows(this)} {
     setModel(rows_);
+    setItemDelegate(new RowDelegate(this));
+    setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     setUniformItemSizes(true);
     setSelectionMode(SingleSelection);
     setEditTriggers(NoEditTriggers);
@@ -80,6 +102,7 @@ void QListBox::append(std::string text) {
     std::vector<std::string> texts;
     texts.push_back(std::move(text));
     append(std::move(texts));
+    scrollTo(rows_->index(count() - 1));
 }
 
 void QListBox::append(std::vector<std::string> texts) { rows_->append(std::move(texts)); }
@@ -134,6 +157,34 @@ void QListBox::mouseDoubleClickEvent(QMouseEvent *event) {
         setCurrentRow(index.row());
         emitSelected(index.row());
     }
+}
+
+void QListBox::paintEvent(QPaintEvent *event) {
+    QListView::paintEvent(event);
+    if (!hasFocus() || currentRow()) {
+        return; // The view shows the focus at the current row.
+    }
+    QStyleOptionFocusRect frame;
+    frame.initFrom(viewport());
+    frame.state |= QStyle::State_HasFocus | QStyle::State_KeyboardFocusChange;
+    frame.backgroundColor = palette().color(QPalette::Base);
+    QPainter painter{viewport()};
+    style()->drawPrimitive(QStyle::PE_FrameFocusRect, &frame, &painter, this);
+}
+
+bool QListBox::viewportEvent(QEvent *event) {
+    if (event->type() == QEvent::ToolTip) {
+        const QModelIndex index = indexAt(static_cast<QHelpEvent *>(event)->pos());
+        QStyleOptionViewItem option;
+        initViewItemOption(&option);
+        const auto *delegate = static_cast<RowDelegate *>(itemDelegate());
+        if (!index.isValid() ||
+            delegate->textWidth(option, index) <= visualRect(index).width()) {
+            QToolTip::hideText();
+            return true;
+        }
+    }
+    return QListView::viewportEvent(event);
 }
 
 QItemSelectionModel::SelectionFlags QListBox::selectionCommand(const QModelIndex &index,

@@ -7,8 +7,9 @@
 #include <vector>
 
 /// A list of one byte text a row. The current row is always the highlighted one, and there is none
-/// until the user or the program chooses one: getting the focus does not choose. Filling, changing
-/// and scrolling stay linear with a million rows.
+/// until the user or the program chooses one: getting the focus does not choose. A row that is wider
+/// than the list ends in dots, and a tool tip shows more of it. Filling, changing and scrolling stay
+/// linear with a million rows.
 class QListBox : public QListView {
     Q_OBJECT
 
@@ -19,8 +20,9 @@ public:
     /// `row` is 0 to count() - 1; so in all that follows.
     [[nodiscard]] const std::string &text(int row) const;
 
+    /// Adds a row and scrolls it into sight, without choosing it.
     void append(std::string text);
-    /// Adds many rows with one repaint.
+    /// Adds many rows with one repaint; does not scroll.
     void append(std::vector<std::string> texts);
     void changeText(int row, std::string text);
     /// When the current row goes, the one that takes its place, or else the last, becomes current.
@@ -42,6 +44,8 @@ protected:
     void focusInEvent(QFocusEvent *event) override;
     void keyPressEvent(QKeyEvent *event) override;
     void mouseDoubleClickEvent(QMouseEvent *event) override;
+    void paintEvent(QPaintEvent *event) override;
+    bool viewportEvent(QEvent *event) override;
     QItemSelectionModel::SelectionFlags selectionCommand(const QModelIndex &index,
                                                          const QEvent *event) const override;
 
@@ -49,5 +53,6 @@ private:
     void emitSelected(int row);
 
     class Rows;
+    class RowDelegate;
     Rows *rows_;
 };

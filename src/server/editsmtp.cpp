@@ -5,10 +5,10 @@
 
 EditSMTP::EditSMTP(QWidget *parent, const char *name, const smtpreject_entry *entry)
     : FormDialog(parent, name, "Email Address Aliasing"),
-      address_{addField("&Address:", {60, 18},
+      address_{addField(translatable("&Address:"), {60, 18},
                         entry != nullptr ? std::string_view{entry->domain} : "")} {
+    addButtons(0, 15);
     fixSize({300, 70}, {298, 45});
-    addButtonRow();
 }
 
 std::string EditSMTP::address() const { return fieldBytes(address_); }

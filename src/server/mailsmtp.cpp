@@ -27,7 +27,7 @@ MailSMTP::MailSMTP(QWidget *parent, const char *name)
                           &MailSMTP::Selected);
     group->column()->addStretch();
     form_.pageLayout()->addWidget(group);
-    form_.pageLayout()->addStretch();
+    form_.pageLayout()->addStretch(1);
 }
 
 void MailSMTP::loadValues() {}

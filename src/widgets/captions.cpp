@@ -1,30 +1,38 @@
 #include "widgets/captions.h"
 
-#include "platform/kapplication.h"
+#include "widgets/leastsize.h"
 
-#include <QApplication>
-#include <QFontMetrics>
 #include <QLabel>
 
-namespace {
-
-int captionWidth(const QString &caption) {
-    return QFontMetrics{QApplication::font("QLabel")}.size(Qt::TextShowMnemonic, caption).width();
+QString translated(TranslatableText caption) {
+    return KApplication::getLocale()->translate(caption);
 }
 
-} // namespace
-
-QString translated(const char *caption) { return KApplication::getLocale()->translate(caption); }
-
-QSize widened(QSize label, std::initializer_list<QString> captions) {
-    for (const QString &caption : captions) {
-        label = label.expandedTo({captionWidth(caption), 0});
+QString plainName(QString caption) {
+    caption.remove('&');
+    while (caption.endsWith(':') || caption.endsWith('.') || caption.endsWith(QChar::Nbsp)) {
+        caption.chop(1);
     }
+    return caption.trimmed();
+}
+
+QLabel *newLabel(const QString &caption, QSize least, QWidget *parent) {
+    auto *label = new QLabel(caption, parent);
+    label->setFixedSize(leastSize(label, least));
     return label;
 }
 
-QLabel *newLabel(const QString &caption, QSize size, QWidget *parent) {
-    auto *label = new QLabel(caption, parent);
-    label->setFixedSize(size.expandedTo({captionWidth(caption), 0}));
+QLabel *CaptionColumn::newCaption(const QString &caption, QWidget *field) {
+    auto *label = new QLabel(caption, field->parentWidget());
+    label->setBuddy(field);
+    const QSize size = leastSize(label, least_);
+    if (size.height() > 0) {
+        label->setFixedHeight(size.height());
+    }
+    labels_.push_back(label);
+    least_.setWidth(size.width());
+    for (QLabel *above : labels_) {
+        above->setFixedWidth(size.width());
+    }
     return label;
 }

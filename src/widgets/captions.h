@@ -1,19 +1,35 @@
 #pragma once
 
+#include "platform/kapplication.h"
+
 #include <QSize>
 #include <QString>
 
-#include <initializer_list>
+#include <vector>
 
 class QLabel;
 class QWidget;
 
 /// The caption in the user's language.
-QString translated(const char *caption);
+QString translated(TranslatableText caption);
 
-/// A label's size widened to the widest of the captions, so that fields below each other
-/// begin in one line.
-QSize widened(QSize label, std::initializer_list<QString> captions);
+/// What a caption calls its field: without "&", and without ":" or "..." at its end.
+QString plainName(QString caption);
 
 /// A label of at least that size in which the whole caption is seen.
-QLabel *newLabel(const QString &caption, QSize size, QWidget *parent);
+QLabel *newLabel(const QString &caption, QSize least, QWidget *parent);
+
+/// The captions of one form's fields. All are as wide as the widest of them needs, so that the
+/// fields beside them begin at one x.
+class CaptionColumn {
+public:
+    /// A height of 0 leaves the captions' height to their rows.
+    explicit CaptionColumn(QSize least) : least_{least} {}
+
+    /// A label in the field's parent, with the field as its buddy.
+    QLabel *newCaption(const QString &caption, QWidget *field);
+
+private:
+    QSize least_;
+    std::vector<QLabel *> labels_;
+};

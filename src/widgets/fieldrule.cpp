@@ -1,9 +1,9 @@
 #include "widgets/fieldrule.h"
 
 #include "platform/bytetext.h"
+#include "widgets/fieldtip.h"
 
 #include <QLineEdit>
-#include <QToolTip>
 #include <QValidator>
 
 #include <algorithm>
@@ -49,19 +49,15 @@ private:
     QString textSet_;
 };
 
-void showToolTip(QLineEdit *field) {
-    QToolTip::showText(field->mapToGlobal(QPoint{0, field->height()}), field->toolTip(), field);
-}
-
 } // namespace
 
 void applyRule(QLineEdit *field, const FieldRule &rule) {
     if (field->isReadOnly()) {
         return;
     }
-    field->setToolTip(rule.toolTip);
+    setFieldTip(field, rule.toolTip);
     field->setValidator(new RuleValidator(field, rule));
-    QObject::connect(field, &QLineEdit::inputRejected, field, [field] { showToolTip(field); });
+    QObject::connect(field, &QLineEdit::inputRejected, field, [field] { showFieldTip(field); });
 }
 
 void replaceByRule(QLineEdit *field, const QString &text) {
@@ -72,7 +68,7 @@ void replaceByRule(QLineEdit *field, const QString &text) {
     int position = static_cast<int>(text.size());
     if (field->validator() != nullptr &&
         field->validator()->validate(accepted, position) != QValidator::Acceptable) {
-        showToolTip(field);
+        showFieldTip(field);
         return;
     }
     field->setText(accepted);

@@ -1,6 +1,7 @@
 #include "widgets/fieldtext.h"
 
 #include "platform/bytetext.h"
+#include "widgets/fieldtip.h"
 
 #include <QLineEdit>
 #include <QVariant>
@@ -32,7 +33,7 @@ void showBytes(QLineEdit *field, std::string_view bytes) {
     if (isTooLong) {
         field->setProperty(wholeText,
                            QByteArray(bytes.data(), static_cast<qsizetype>(bytes.size())));
-        field->setToolTip(QStringLiteral("Too long to be edited here: this is its beginning"));
+        setFieldTip(field, QStringLiteral("Too long to be edited here: this is its beginning"));
     }
 }
 

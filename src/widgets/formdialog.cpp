@@ -1,7 +1,9 @@
 #include "widgets/formdialog.h"
 
+#include "platform/helpkey.h"
+#include "widgets/fieldrule.h"
 #include "widgets/fieldtext.h"
-#include "widgets/pagelayout.h"
+#include "widgets/leastsize.h"
 
 #include <QFileDialog>
 #include <QFrame>
@@ -15,29 +17,44 @@
 namespace {
 
 constexpr QSize buttonSize{70, 30};
-/// The dialogs are low; what their borders leave over is shared out above and below the rows.
-constexpr int leastBorder = 2;
+constexpr int leastCharactersSeen = 16;
+
+/// There is no path after "Cancel", and the toolkit replaces bytes of a name that are not UTF-8:
+/// such a path would lead elsewhere.
+bool isWholePath(const QString &path) {
+    return !path.isEmpty() && !path.contains(QChar::ReplacementCharacter);
+}
+
+void browse(QLineEdit *field, QFileDialog &chooser) {
+    if (field->isReadOnly() || chooser.exec() != QDialog::Accepted) {
+        return;
+    }
+    const QString path = chooser.selectedFiles().value(0);
+    if (isWholePath(path)) {
+        replaceByRule(field, path);
+    }
+}
 
 } // namespace
 
-FormDialog::FormDialog(QWidget *parent, const char *name, const char *caption)
-    : QDialog(parent), panel_{new QFrame(this)}, rows_{new QVBoxLayout(panel_)} {
+FormDialog::FormDialog(QWidget *parent, const char *name, const char *caption,
+                       std::optional<int> aroundFieldText)
+    : QDialog(parent),
+      aroundFieldText_{aroundFieldText},
+      panel_{new QFrame(this)},
+      layout_{new QVBoxLayout(this)},
+      rows_{new QVBoxLayout},
+      buttons_{new QHBoxLayout} {
     setObjectName(name);
     setWindowTitle(QString::fromUtf8(caption));
+    setWindowModality(Qt::WindowModal);
+    addHelpKey(this);
     panel_->setFrameStyle(static_cast<int>(QFrame::WinPanel) | static_cast<int>(QFrame::Raised));
     panel_->setLineWidth(1);
-    rows_->setContentsMargins(pageBorder, leastBorder, pageBorder, leastBorder);
+    layout_->setContentsMargins(pageBorder, 0, pageBorder, 0);
+    layout_->setSpacing(0);
     rows_->setSpacing(groupSpacing);
-    auto *layout = new QVBoxLayout(this);
-    layout->setContentsMargins(0, 0, 0, 0);
-    layout->setSpacing(0);
-    layout->addWidget(panel_);
-}
-
-void FormDialog::fixSize(QSize dialog, QSize panel) {
-    setFixedSize(dialog);
-    panel_->setFixedSize(panel.width(),
-                         std::min(panel.height(), dialog.height() - buttonSize.height()));
+    buttons_->setSpacing(groupSpacing);
 }
 
 QHBoxLayout *FormDialog::addRow() {
@@ -47,55 +64,72 @@ QHBoxLayout *FormDialog::addRow() {
     return row;
 }
 
-QLineEdit *FormDialog::addField(const char *caption, QSize label, std::string_view bytes) {
-    return addField(addRow(), caption, label, bytes);
+QLineEdit *FormDialog::addField(TranslatableText caption, QSize label, std::string_view bytes) {
+    CaptionColumn captions{label};
+    return addField(addRow(), caption, captions, bytes);
 }
 
-QLineEdit *FormDialog::addField(QHBoxLayout *row, const char *caption, QSize label,
-                                std::string_view bytes) {
-    QLineEdit *field = newField(panel_);
-    field->setFixedHeight(fieldHeight);
+QLineEdit *FormDialog::addField(QHBoxLayout *row, TranslatableText caption,
+                                CaptionColumn &captions, std::string_view bytes) {
+    QLineEdit *field = newField(this);
+    field->setMinimumWidth(leastCharactersSeen * field->fontMetrics().averageCharWidth());
     showBytes(field, bytes);
-    QLabel *captionLabel = newLabel(translated(caption), label, panel_);
-    captionLabel->setBuddy(field);
-    row->addWidget(captionLabel);
-    row->addWidget(field);
+    row->addWidget(captions.newCaption(translated(caption), field));
+    addAsField(row, field);
     return field;
 }
 
-void FormDialog::addButtonRow() {
-    auto *row = new QHBoxLayout;
-    row->setContentsMargins(pageBorder, 0, pageBorder, 0);
-    row->setSpacing(groupSpacing);
-    row->addStretch();
-    for (const auto &[caption, slot] :
-         {std::pair{"OK", &QDialog::accept}, std::pair{"Cancel", &QDialog::reject}}) {
-        auto *button = new QPushButton(QString::fromUtf8(caption), this);
-        button->setFixedSize(buttonSize);
-        button->setDefault(slot == &QDialog::accept);
-        connect(button, &QPushButton::clicked, this, slot);
-        row->addWidget(button);
-    }
-    static_cast<QVBoxLayout *>(layout())->addLayout(row);
-}
-
-QPushButton *addBrowseButton(QHBoxLayout *row, int width, QWidget *parent) {
-    auto *button = new QPushButton(QStringLiteral("Browse..."), parent);
-    button->setFixedSize(width, FormDialog::fieldHeight);
-    row->addWidget(button);
+QPushButton *FormDialog::addBrowseButton(QHBoxLayout *row, int width, TranslatableText caption) {
+    auto *button = new QPushButton(QStringLiteral("Browse..."), this);
+    button->setAccessibleName(plainName(translated(caption)) + ": " + button->text());
+    button->setFixedWidth(leastSize(button, {width, fieldHeight}).width());
+    const int height = row->itemAt(row->count() - 1)->widget()->maximumHeight();
+    addOfHeight(row, button, height, aroundFieldText_);
     return button;
 }
 
-bool isWholePath(const QString &path) {
-    return !path.isEmpty() && !path.contains(QChar::ReplacementCharacter);
+void FormDialog::addAsField(QHBoxLayout *row, QWidget *widget) {
+    addOfHeight(row, widget, fieldHeight, aroundFieldText_);
+}
+
+void FormDialog::addButtons(int aboveRows, int aboveButtons, Shrinking shrinking) {
+    addSpace(layout_, aboveRows, shrinking);
+    layout_->addLayout(rows_);
+    addSpace(layout_, aboveButtons, shrinking);
+    layout_->addLayout(buttons_);
+    buttons_->addStretch();
+    for (const auto &[caption, slot] :
+         {std::pair{"OK", &QDialog::accept}, std::pair{"Cancel", &QDialog::reject}}) {
+        auto *button = new QPushButton(QString::fromUtf8(caption), this);
+        button->setFixedSize(leastSize(button, buttonSize));
+        button->setDefault(slot == &QDialog::accept);
+        connect(button, &QPushButton::clicked, this, slot);
+        buttons_->addWidget(button);
+    }
+}
+
+void FormDialog::fixSize(QSize dialog, QSize panel) {
+    besidePanel_ = dialog - panel;
+    setFixedSize(dialog.expandedTo(layout_->totalMinimumSize()));
+}
+
+void FormDialog::resizeEvent(QResizeEvent *event) {
+    QDialog::resizeEvent(event);
+    const QSize panel = size() - besidePanel_;
+    panel_->setGeometry(0, 0, panel.width(),
+                        std::min(panel.height(), buttons_->geometry().top()));
 }
 
 void browseForFile(QLineEdit *field, QWidget *parent) {
-    if (field->isReadOnly()) {
-        return;
-    }
-    const QString path = QFileDialog::getOpenFileName(parent, {}, field->text());
-    if (isWholePath(path)) {
-        field->setText(path);
-    }
+    QFileDialog chooser{parent, {}, field->text()};
+    chooser.setFileMode(QFileDialog::ExistingFile);
+    browse(field, chooser);
+}
+
+void browseForDirectory(QLineEdit *field, QWidget *parent) {
+    QFileDialog chooser{parent, {}, field->text()};
+    chooser.setObjectName("browse");
+    chooser.setFileMode(QFileDialog::Directory);
+    chooser.setOption(QFileDialog::ShowDirsOnly);
+    browse(field, chooser);
 }

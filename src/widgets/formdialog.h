@@ -1,6 +1,7 @@
 #pragma once
 
 #include "widgets/captions.h"
+#include "widgets/pagelayout.h"
 
 #include <QDialog>
 
@@ -14,43 +15,54 @@ class QVBoxLayout;
 
 /// What all edit dialogs are made of: a raised panel with the rows on it and, below, "OK" and
 /// "Cancel". A dialog collects input and applies nothing; who opened it reads it when it was
-/// accepted.
+/// accepted. It is modal to the windows that it was opened from; the help window stays usable.
 class FormDialog : public QDialog {
 public:
     static constexpr int fieldHeight = 25;
 
 protected:
-    FormDialog(QWidget *parent, const char *name, const char *caption);
-
-    /// Fixes the dialog's size and the panel's. Where the panel would reach into the button row, it
-    /// ends above it.
-    void fixSize(QSize dialog, QSize panel);
+    /// With `aroundFieldText` the fields may shrink; see addOfHeight.
+    FormDialog(QWidget *parent, const char *name, const char *caption,
+               std::optional<int> aroundFieldText = std::nullopt);
 
     /// The rows on the panel, from top to bottom.
     [[nodiscard]] QVBoxLayout *rows() const { return rows_; }
     QHBoxLayout *addRow();
 
-    /// A row of a label and a line edit showing `bytes`; the label is the edit's buddy. A caption
-    /// that is wider than `label` keeps its width.
-    QLineEdit *addField(const char *caption, QSize label, std::string_view bytes);
-    /// The same in a row that is there already. The caption is translated.
-    QLineEdit *addField(QHBoxLayout *row, const char *caption, QSize label, std::string_view bytes);
+    /// A row of a label and a line edit showing `bytes`; the label is the edit's buddy. `label` is
+    /// the label's least size.
+    QLineEdit *addField(TranslatableText caption, QSize label, std::string_view bytes);
+    /// The same in a row that is there already, and in a column of captions.
+    QLineEdit *addField(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
+                        std::string_view bytes);
+    /// The push button "Browse..." behind the row's field, which is the one captioned `caption`, and
+    /// as high.
+    QPushButton *addBrowseButton(QHBoxLayout *row, int width, TranslatableText caption);
+    /// As high as the fields.
+    void addAsField(QHBoxLayout *row, QWidget *widget);
 
-    /// To be called when all rows are there, so that the buttons come last with Tab as well.
-    void addButtonRow();
+    /// To be called when all rows are there, so that the buttons come last with Tab as well. The
+    /// numbers are the pixels above the rows and between rows and buttons.
+    void addButtons(int aboveRows, int aboveButtons, Shrinking shrinking = Shrinking::No);
+
+    /// Fixes the dialog's size and with it the panel's; both grow by what a larger font needs
+    /// more. Where the panel would reach into the button row, it ends above it.
+    void fixSize(QSize dialog, QSize panel);
+
+    void resizeEvent(QResizeEvent *event) override;
 
 private:
+    std::optional<int> aroundFieldText_;
     QFrame *panel_;
+    QVBoxLayout *layout_;
     QVBoxLayout *rows_;
+    QHBoxLayout *buttons_;
+    QSize besidePanel_; ///< What the dialog has more than the panel; a panel of its own otherwise.
 };
-
-/// The push button "Browse..." at the end of a row.
-QPushButton *addBrowseButton(QHBoxLayout *row, int width, QWidget *parent);
-
-/// Whether a file dialog's answer names the file that was picked: there is none after "Cancel", and
-/// the toolkit replaces bytes of the name that are not UTF-8.
-bool isWholePath(const QString &path);
 
 /// Lets the user pick a file, beginning with the one that the field names, and puts its path into
 /// the field; a cancelled choice leaves the field as it is.
 void browseForFile(QLineEdit *field, QWidget *parent);
+
+/// The same for a directory; the chooser is named "browse".
+void browseForDirectory(QLineEdit *field, QWidget *parent);

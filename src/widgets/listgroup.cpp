@@ -1,38 +1,55 @@
 #include "widgets/listgroup.h"
 
-#include "widgets/pagelayout.h"
+#include "widgets/captions.h"
+#include "widgets/leastsize.h"
 
-#include <QHBoxLayout>
+#include <algorithm>
 
-ListGroup::ListGroup(const char *caption, Stretch stretch, QWidget *parent)
+namespace {
+
+/// For a button in a group that shrinks.
+constexpr int buttonHeight = 22;
+constexpr int aroundButtonText = 2;
+
+} // namespace
+
+ListGroup::ListGroup(const char *caption, Stretch stretch, QWidget *parent, Shrinking shrinking)
     : QGroupBox(QString::fromUtf8(caption), parent),
       box_{new QListBox(this)},
       column_{new QVBoxLayout},
-      layout_{newGroupLayout(this)} {
-    box_->setAccessibleName(title());
-    column_->setSpacing(groupSpacing);
+      shrinking_{shrinking} {
     auto *row = new QHBoxLayout;
+    newGroupRows(this, shrinking)->addLayout(row);
+    row->setSpacing(groupSpacing);
     row->addWidget(box_, stretch.box);
     row->addLayout(column_, stretch.column);
-    layout_->addLayout(row);
-}
-
-void ListGroup::makeTight() {
-    delete layout_->takeAt(0); // The space above the first row.
-    layout_->setContentsMargins(tightBorder, tightBorder, tightBorder, tightBorder);
-    column_->setSpacing(0);
+    column_->setSpacing(shrinking == Shrinking::Yes ? 0 : groupSpacing);
+    box_->setAccessibleName(title());
 }
 
 QPushButton *ListGroup::addButton(const char *caption) {
     auto *button = new QPushButton(QString::fromUtf8(caption), this);
-    column_->addWidget(button);
+    button->setAccessibleName(title() + ": " + button->text());
+    if (shrinking_ == Shrinking::No) {
+        column_->addWidget(button);
+        return button;
+    }
+    if (column_->count() > 0) {
+        addSpace(column_, groupSpacing, shrinking_);
+    }
+    addOfHeight(column_, button, buttonHeight, aroundButtonText);
     return button;
 }
 
 void ListGroup::fixColumnWidth(int width) {
+    std::vector<QWidget *> widgets;
     for (int index = 0; index < column_->count(); ++index) {
         if (QWidget *widget = column_->itemAt(index)->widget()) {
-            widget->setFixedWidth(width);
+            widgets.push_back(widget);
+            width = leastSize(widget, {width, buttonHeight}).width();
         }
+    }
+    for (QWidget *widget : widgets) {
+        widget->setFixedWidth(width);
     }
 }

@@ -1,11 +1,10 @@
 #pragma once
 
 #include "platform/qlistbox.h"
+#include "widgets/pagelayout.h"
 
 #include <QGroupBox>
 #include <QPushButton>
-
-class QVBoxLayout;
 
 /// A list box with a column of buttons to its right, in a group.
 class ListGroup : public QGroupBox {
@@ -18,7 +17,8 @@ public:
         int column;
     };
 
-    ListGroup(const char *caption, Stretch stretch, QWidget *parent);
+    ListGroup(const char *caption, Stretch stretch, QWidget *parent,
+              Shrinking shrinking = Shrinking::No);
 
     [[nodiscard]] QListBox *box() const { return box_; }
     /// For what stands below the buttons.
@@ -26,11 +26,8 @@ public:
 
     QPushButton *addButton(const char *caption);
 
-    /// Takes back the border and the spacings that the group has on a page, for a window that has
-    /// no room for them.
-    void makeTight();
-
-    /// Makes everything that the column holds by now `width` pixels wide.
+    /// Makes everything that the column holds by now `width` pixels wide, or as wide as the widest
+    /// text in it needs.
     void fixColumnWidth(int width);
 
     /// Adds the three buttons that every list has and sends them, and a row that was chosen, to the
@@ -42,7 +39,7 @@ public:
 private:
     QListBox *box_;
     QVBoxLayout *column_;
-    QVBoxLayout *layout_;
+    Shrinking shrinking_;
 };
 
 template <class Receiver, class AddSlot, class ModifySlot, class RemoveSlot, class SelectedSlot>

@@ -1,6 +1,7 @@
 #include "widgets/numberfield.h"
 
 #include "platform/knumericspinbox.h"
+#include "widgets/leastsize.h"
 
 namespace {
 
@@ -14,6 +15,6 @@ KNumericSpinBox *newNumberField(QWidget *parent, int lowest, int highest, int va
     field->setStep(1);
     field->setEditable(true);
     field->setValue(value);
-    field->setFixedWidth(usualWidth);
+    field->setFixedWidth(leastSize(field, {usualWidth, 0}).width());
     return field;
 }

@@ -4,11 +4,28 @@
 #include <QString>
 #include <QVBoxLayout>
 
+#include <optional>
+
 /// The measures, in pixels, that all pages share.
 constexpr int pageBorder = 10;
 constexpr int groupSpacing = 5;
-constexpr int tightBorder = 2;
 constexpr int spaceAboveFirstRow = 10;
+
+/// Whether borders, spacings and rows grow lower where the window is too low for all of them, each
+/// by its share of what is missing.
+enum class Shrinking { No, Yes };
+
+inline void addSpace(QVBoxLayout *layout, int height, Shrinking shrinking) {
+    layout->addItem(
+        new QSpacerItem(0, height, QSizePolicy::Minimum,
+                        shrinking == Shrinking::Yes ? QSizePolicy::Maximum : QSizePolicy::Fixed));
+}
+
+/// Adds a widget, and makes it the layout's widget's child. It is `height` pixels high, or as high as its text
+/// needs. With `aroundText` it grows lower where the window is too low, but keeps that many pixels
+/// more than its font's height.
+void addOfHeight(QBoxLayout *layout, QWidget *widget, int height,
+                 std::optional<int> aroundText = std::nullopt);
 
 inline QVBoxLayout *newPageLayout(QWidget *page) {
     auto *layout = new QVBoxLayout(page);
@@ -16,10 +33,16 @@ inline QVBoxLayout *newPageLayout(QWidget *page) {
     return layout;
 }
 
-inline QVBoxLayout *newGroupLayout(QGroupBox *group) {
+/// The rows of a group, from the first one's upper edge to the last one's lower: a layout of its own
+/// between the group's borders, without spacing when it shrinks.
+inline QVBoxLayout *newGroupRows(QGroupBox *group, Shrinking shrinking = Shrinking::No) {
     auto *layout = new QVBoxLayout(group);
-    layout->setContentsMargins(pageBorder, pageBorder, pageBorder, pageBorder);
-    layout->setSpacing(groupSpacing);
-    layout->addSpacing(spaceAboveFirstRow);
-    return layout;
+    auto *rows = new QVBoxLayout;
+    layout->setContentsMargins(pageBorder, 0, pageBorder, 0);
+    layout->setSpacing(0);
+    rows->setSpacing(shrinking == Shrinking::Yes ? 0 : groupSpacing);
+    addSpace(layout, pageBorder + spaceAboveFirstRow, shrinking);
+    layout->addLayout(rows);
+    addSpace(layout, pageBorder, shrinking);
+    return rows;
 }

@@ -1,8 +1,8 @@
 #include "widgets/settingsform.h"
 
 #include "platform/knumericspinbox.h"
-#include "widgets/captions.h"
 #include "widgets/fieldtext.h"
+#include "widgets/fieldtip.h"
 #include "widgets/numberfield.h"
 #include "widgets/pagelayout.h"
 
@@ -12,11 +12,11 @@
 #include <QLineEdit>
 
 SettingsForm::SettingsForm(QWidget *page, int labelWidth)
-    : pageLayout_{newPageLayout(page)}, labelWidth_{labelWidth} {}
+    : pageLayout_{newPageLayout(page)}, captions_{{labelWidth, 0}} {}
 
 void SettingsForm::group(const char *caption) {
     group_ = new QGroupBox(QString::fromUtf8(caption), pageLayout_->parentWidget());
-    groupLayout_ = newGroupLayout(group_);
+    groupLayout_ = newGroupRows(group_);
     pageLayout_->addWidget(group_);
 }
 
@@ -34,16 +34,17 @@ void SettingsForm::number(const char *caption, int lowest, int highest, NumberSe
     KNumericSpinBox *box = newNumberField(group_, lowest, highest, setting.value);
     QHBoxLayout *row = newRow(caption, box);
     if (note != nullptr) {
-        row->addWidget(new QLabel(QString::fromUtf8(note), group_));
+        auto *label = new QLabel(QString::fromUtf8(note), group_);
+        label->setBuddy(box);
+        box->setAccessibleDescription(label->text());
+        row->addWidget(label);
     }
     row->addStretch();
     stores_.emplace_back([box, &setting] { setting.value = box->getValue(); });
 }
 
 void SettingsForm::text(const char *caption, TextSetting &setting) {
-    QLineEdit *field = newField(group_);
-    showBytes(field, setting.value.value_or(std::string{}));
-    newRow(caption, field);
+    QLineEdit *field = newTextField(caption, setting.value.value_or(std::string{}));
     stores_.emplace_back([field, &setting] {
         const std::string bytes = fieldBytes(field);
         if (setting.value || !bytes.empty()) {
@@ -53,9 +54,14 @@ void SettingsForm::text(const char *caption, TextSetting &setting) {
 }
 
 void SettingsForm::accessList(const char *caption, AccessListSetting &setting) {
-    QLineEdit *field = newField(group_);
-    showBytes(field, accessListSetting(setting.value, std::nullopt).value_or(std::string{}));
-    newRow(caption, field);
+    QLineEdit *field = newTextField(
+        caption, accessListSetting(setting.value, std::nullopt).value_or(std::string{}));
+    const QString syntax = QStringLiteral(
+        "\"all\", \"none\" or IPv4 addresses, with commas between them.\n"
+        "Behind an address: /8, /16, /24 or /32, or a blank and a mask.\n"
+        "Any other size is stored as one of these: 172.16.0.0/12 as 172.16.0.0/16.");
+    setFieldTip(field, syntax);
+    field->setAccessibleDescription(syntax);
     stores_.emplace_back(
         [field, &setting] { accessListSetting(setting.value, fieldBytes(field)); });
 }
@@ -74,12 +80,15 @@ QHBoxLayout *SettingsForm::newRow() {
 }
 
 QHBoxLayout *SettingsForm::newRow(const char *caption, QWidget *field) {
-    const QString text = QString::fromUtf8(caption);
-    auto *label = new QLabel(text, group_);
-    label->setFixedWidth(widened({labelWidth_, 0}, {text}).width());
-    label->setBuddy(field);
     QHBoxLayout *row = newRow();
-    row->addWidget(label);
+    row->addWidget(captions_.newCaption(QString::fromUtf8(caption), field));
     row->addWidget(field);
     return row;
+}
+
+QLineEdit *SettingsForm::newTextField(const char *caption, std::string_view bytes) {
+    QLineEdit *field = newField(group_);
+    showBytes(field, bytes);
+    newRow(caption, field);
+    return field;
 }

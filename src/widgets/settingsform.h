@@ -1,6 +1,7 @@
 #pragma once
 
 #include "config/settings.h"
+#include "widgets/captions.h"
 
 #include <QVBoxLayout>
 
@@ -9,7 +10,7 @@
 
 class QGroupBox;
 class QHBoxLayout;
-class QLabel;
+class QLineEdit;
 class QWidget;
 
 /// The groups of captions and fields on a page that edit settings. Each row names its widget and
@@ -17,7 +18,7 @@ class QWidget;
 /// the letter that moves the focus to its field.
 class SettingsForm {
 public:
-    /// Lays out `page`. Captions are `labelWidth` pixels wide.
+    /// Lays out `page`. Captions are at least `labelWidth` pixels wide.
     SettingsForm(QWidget *page, int labelWidth);
 
     /// Begins a group; the rows after it stand in it.
@@ -40,10 +41,11 @@ public:
 private:
     QHBoxLayout *newRow();
     QHBoxLayout *newRow(const char *caption, QWidget *field);
+    QLineEdit *newTextField(const char *caption, std::string_view bytes);
 
     QVBoxLayout *pageLayout_;
     QVBoxLayout *groupLayout_ = nullptr;
     QGroupBox *group_ = nullptr;
-    int labelWidth_;
+    CaptionColumn captions_;
     std::vector<std::function<void()>> stores_;
 };

@@ -1,0 +1,14 @@
+#pragma once
+
+#include <QString>
+
+class QWidget;
+
+/// Tool tips of fields. They appear beside the field's window rather than below the field, where
+/// they would cover the next one and take its click.
+
+/// Gives the field a tool tip of its own.
+void setFieldTip(QWidget *field, const QString &text);
+
+/// Shows the field's tool tip now.
+void showFieldTip(const QWidget *field);

@@ -1,0 +1,61 @@
+#include "widgets/leastsize.h"
+
+#include <QPushButton>
+#include <QSpinBox>
+#include <QStyleOptionButton>
+#include <QStyleOptionSpinBox>
+
+#include <algorithm>
+
+namespace {
+
+/// What a line edit inside a number field keeps free on either side, and the cursor's own pixel.
+constexpr int editMargins = 2 * 2 + 1;
+
+/// What a button that has to grow leaves free on either side of its text.
+constexpr int besideButtonText = 4;
+
+/// Of a push button the toolkit's own hint is wider than its text needs.
+QSize forButton(const QPushButton *button, QSize given) {
+    QStyleOptionButton option;
+    option.initFrom(button);
+    option.rect = {{}, given};
+    const QSize room =
+        button->style()->subElementRect(QStyle::SE_PushButtonContents, &option, button).size();
+    const QSize text = button->fontMetrics().size(Qt::TextShowMnemonic, button->text());
+    const QSize beside{text.width() > room.width() ? 2 * besideButtonText : 0, 0};
+    return given - room + text + beside;
+}
+
+/// All numbers between the ends have no more digits than one of them.
+QSize forNumbers(const QSpinBox *box, QSize given) {
+    QStyleOptionSpinBox option;
+    option.initFrom(box);
+    option.rect = {{}, given.expandedTo(box->sizeHint())};
+    const int room = box->style()
+                         ->subControlRect(QStyle::CC_SpinBox, &option,
+                                          QStyle::SC_SpinBoxEditField, box)
+                         .width();
+    const int text =
+        std::max(box->fontMetrics().horizontalAdvance(QString::number(box->minimum())),
+                 box->fontMetrics().horizontalAdvance(QString::number(box->maximum())));
+    return {option.rect.width() - room + editMargins + text, box->minimumSizeHint().height()};
+}
+
+QSize needed(const QWidget *widget, QSize given) {
+    if (const auto *button = qobject_cast<const QPushButton *>(widget)) {
+        return forButton(button, given);
+    }
+    if (const auto *box = qobject_cast<const QSpinBox *>(widget)) {
+        return forNumbers(box, given);
+    }
+    return widget->minimumSizeHint();
+}
+
+} // namespace
+
+QSize leastSize(const QWidget *widget, QSize given) {
+    const QSize text = needed(widget, given);
+    return {given.width() == 0 ? 0 : std::max(given.width(), text.width()),
+            given.height() == 0 ? 0 : std::max(given.height(), text.height())};
+}

@@ -1,0 +1,32 @@
+#include "widgets/pagelayout.h"
+
+#include "widgets/leastsize.h"
+
+#include <QWidget>
+
+namespace {
+
+/// A widget's place whose height depends on nothing but the two that it is made with.
+class ShrinkingItem : public QWidgetItem {
+public:
+    ShrinkingItem(QWidget *widget, int full) : QWidgetItem(widget), full_{full} {}
+
+    [[nodiscard]] QSize sizeHint() const override {
+        return {QWidgetItem::sizeHint().width(), full_};
+    }
+
+private:
+    int full_;
+};
+
+} // namespace
+
+void addOfHeight(QBoxLayout *layout, QWidget *widget, int height, std::optional<int> aroundText) {
+    const int full = leastSize(widget, {0, height}).height();
+    widget->setMaximumHeight(full);
+    widget->setMinimumHeight(aroundText ? widget->fontMetrics().height() + *aroundText : full);
+    if (QWidget *parent = layout->parentWidget()) {
+        widget->setParent(parent);
+    }
+    layout->addItem(new ShrinkingItem(widget, full));
+}
