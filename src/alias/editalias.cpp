@@ -20,8 +20,8 @@ alias_list_entry copyOf(const alias_list_entry &target) {
 
 EditAlias::EditAlias(QWidget *parent, const char *name, const alias_entry *alias)
     : FormDialog(parent, name, "Email Address Aliasing") {
-    address_ =
-        addField(translatable("&Address:"), {70, 18}, alias != nullptr ? std::string_view{alias->address} : "");
+    address_ = addField(translatable("&Address:"), {70, 18},
+                        alias != nullptr ? std::string_view{alias->address} : "");
     applyRule(address_, oneWordRule());
 
     auto *group = new ListGroup("Aliases", {250, 70}, this);

@@ -60,8 +60,8 @@ KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
     createPage(alias_, "alias", "&Aliasing", "tarvex-mail-alias.html");
     createPage(lists_, "list", "&Mail List", "tarvex-mail-list.html");
     if (!mayRewrite(productPaths().master)) {
-        setNote(getLocale()->translate(translatable(
-            "Changes cannot be saved: this user may not write the master file.")));
+        setNote(getLocale()->translate(
+            translatable("Changes cannot be saved: this user may not write the master file.")));
     }
     showDialog();
 }

@@ -25,7 +25,8 @@ EditFetch::EditFetch(QWidget *parent, const char *name, const pop_host *host)
     const pop_host shown = host != nullptr ? *host : pop_host{};
     server_ = addField(addRow(), translatable("&Server:"), captions, popHostText(shown.server));
     user_ = addField(addRow(), translatable("&Username:"), captions, popHostText(shown.user));
-    password_ = addField(addRow(), translatable("&Password:"), captions, popHostText(shown.password));
+    password_ =
+        addField(addRow(), translatable("&Password:"), captions, popHostText(shown.password));
     addButtons(pageBorder, 15);
     fixSize({250, 140}, {247, 110});
 

@@ -26,6 +26,7 @@ constexpr int labelHeight = 20;
 constexpr int checkBoxHeight = 20;
 /// What rows keep around their text's height, in pixels, in a window that is too low for all.
 constexpr int aroundFieldText = 4;
+constexpr int aroundNumber = 6;
 constexpr int aroundCheckBoxText = 1;
 constexpr int leastBoxHeight = 40;
 constexpr QSize leastWindow{600, 350};
@@ -157,8 +158,8 @@ QGroupBox *EditList::newOptions(const maillist_entry &list) {
         options_.push_back({box, bit});
     }
     CaptionColumn captions{{120, labelHeight}};
-    addTrigger(newRow(rows), "Digest size trigger:", captions, {" kB", 30},
-               &maillist_entry::diglen, list);
+    addTrigger(newRow(rows), "Digest size trigger:", captions, {" kB", 30}, &maillist_entry::diglen,
+               list);
     addTrigger(newRow(rows), "Digest count trigger:", captions, {" messages", 100},
                &maillist_entry::digno, list);
     return group;
@@ -168,11 +169,12 @@ void EditList::addTrigger(QHBoxLayout *row, const char *caption, CaptionColumn &
                           const Unit &unit, std::int32_t maillist_entry::*field,
                           const maillist_entry &list) {
     KNumericSpinBox *box = newNumberField(this, 0, highestTrigger, list.*field);
-    row->addWidget(captions.newCaption(QString::fromUtf8(caption), box));
-    addAsField(row, box);
+    // With an alignment the labels' fixed height does not hold the row's down.
+    row->addWidget(captions.newCaption(QString::fromUtf8(caption), box), 0, Qt::AlignVCenter);
+    addOfHeight(row, box, fieldHeight, aroundNumber);
     QLabel *unitLabel = newLabel(QString::fromUtf8(unit.caption), {unit.width, labelHeight}, this);
     unitLabel->setBuddy(box);
-    row->addWidget(unitLabel);
+    row->addWidget(unitLabel, 0, Qt::AlignVCenter);
     row->addStretch();
     triggers_.push_back({box, field});
 }

@@ -103,9 +103,8 @@ KLocale *KApplication::getLocale() {
 }
 
 QString KApplication::shared(const QString &name) {
-    return QDir::cleanPath(QCoreApplication::applicationDirPath() + "/" TARVEX_SHARE_FROM_PROGRAM
-                                                                    "/" +
-                           name);
+    return QDir::cleanPath(QCoreApplication::applicationDirPath() +
+                           "/" TARVEX_SHARE_FROM_PROGRAM "/" + name);
 }
 
 QString KApplication::name() const { return QCoreApplication::applicationName(); }

@@ -54,8 +54,8 @@ public:
 
     static KLocale *getLocale();
 
-    /// The folder or file `name` among what is installed beside the program (share/...). It is found
-    /// from the program's own place, so that a build tree works like an installation.
+    /// The folder or file `name` among what is installed beside the program (share/...). It is
+    /// found from the program's own place, so that a build tree works like an installation.
     static QString shared(const QString &name);
 
     /// The name that the application was made with.

@@ -1,7 +1,7 @@
 #include "platform/kcontroldialog.h"
 
-#include "platform/helpwindow.h"
 #include "platform/helpkey.h"
+#include "platform/helpwindow.h"
 #include "platform/kconfigwidget.h"
 #include "platform/lowscreen.h"
 
@@ -110,6 +110,7 @@ void KControlDialog::fitToScreen() {
         tabs_->insertTab(index, scrolling(tabs_->widget(index)), label);
     }
     tabs_->setCurrentIndex(0);
+    tabs_->updateGeometry(); // It forgets to, as long as it is not shown.
     resize(wanted.boundedTo(room));
 }
 

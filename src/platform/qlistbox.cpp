@@ -178,8 +178,7 @@ bool QListBox::viewportEvent(QEvent *event) {
         QStyleOptionViewItem option;
         initViewItemOption(&option);
         const auto *delegate = static_cast<RowDelegate *>(itemDelegate());
-        if (!index.isValid() ||
-            delegate->textWidth(option, index) <= visualRect(index).width()) {
+        if (!index.isValid() || delegate->textWidth(option, index) <= visualRect(index).width()) {
             QToolTip::hideText();
             return true;
         }

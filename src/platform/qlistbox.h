@@ -7,9 +7,9 @@
 #include <vector>
 
 /// A list of one byte text a row. The current row is always the highlighted one, and there is none
-/// until the user or the program chooses one: getting the focus does not choose. A row that is wider
-/// than the list ends in dots, and a tool tip shows more of it. Filling, changing and scrolling stay
-/// linear with a million rows.
+/// until the user or the program chooses one: getting the focus does not choose. A row that is
+/// wider than the list ends in dots, and a tool tip shows more of it. Filling, changing and
+/// scrolling stay linear with a million rows.
 class QListBox : public QListView {
     Q_OBJECT
 

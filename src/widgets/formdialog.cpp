@@ -69,8 +69,8 @@ QLineEdit *FormDialog::addField(TranslatableText caption, QSize label, std::stri
     return addField(addRow(), caption, captions, bytes);
 }
 
-QLineEdit *FormDialog::addField(QHBoxLayout *row, TranslatableText caption,
-                                CaptionColumn &captions, std::string_view bytes) {
+QLineEdit *FormDialog::addField(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
+                                std::string_view bytes) {
     QLineEdit *field = newField(this);
     field->setMinimumWidth(leastCharactersSeen * field->fontMetrics().averageCharWidth());
     showBytes(field, bytes);
@@ -116,8 +116,7 @@ void FormDialog::fixSize(QSize dialog, QSize panel) {
 void FormDialog::resizeEvent(QResizeEvent *event) {
     QDialog::resizeEvent(event);
     const QSize panel = size() - besidePanel_;
-    panel_->setGeometry(0, 0, panel.width(),
-                        std::min(panel.height(), buttons_->geometry().top()));
+    panel_->setGeometry(0, 0, panel.width(), std::min(panel.height(), buttons_->geometry().top()));
 }
 
 void browseForFile(QLineEdit *field, QWidget *parent) {

@@ -35,8 +35,8 @@ protected:
     /// The same in a row that is there already, and in a column of captions.
     QLineEdit *addField(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
                         std::string_view bytes);
-    /// The push button "Browse..." behind the row's field, which is the one captioned `caption`, and
-    /// as high.
+    /// The push button "Browse..." behind the row's field, which is the one captioned `caption`,
+    /// and as high.
     QPushButton *addBrowseButton(QHBoxLayout *row, int width, TranslatableText caption);
     /// As high as the fields.
     void addAsField(QHBoxLayout *row, QWidget *widget);

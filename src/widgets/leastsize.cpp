@@ -31,14 +31,16 @@ QSize forButton(const QPushButton *button, QSize given) {
 QSize forNumbers(const QSpinBox *box, QSize given) {
     QStyleOptionSpinBox option;
     option.initFrom(box);
+    option.frame = box->hasFrame();
     option.rect = {{}, given.expandedTo(box->sizeHint())};
-    const int room = box->style()
-                         ->subControlRect(QStyle::CC_SpinBox, &option,
-                                          QStyle::SC_SpinBoxEditField, box)
-                         .width();
-    const int text =
-        std::max(box->fontMetrics().horizontalAdvance(QString::number(box->minimum())),
-                 box->fontMetrics().horizontalAdvance(QString::number(box->maximum())));
+    const int room =
+        box->style()
+            ->subControlRect(QStyle::CC_SpinBox, &option, QStyle::SC_SpinBoxEditField, box)
+            .width();
+    const auto widthOf = [box](int number) {
+        return box->fontMetrics().size(0, QString::number(number)).width();
+    };
+    const int text = std::max(widthOf(box->minimum()), widthOf(box->maximum()));
     return {option.rect.width() - room + editMargins + text, box->minimumSizeHint().height()};
 }
 

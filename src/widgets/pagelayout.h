@@ -21,9 +21,9 @@ inline void addSpace(QVBoxLayout *layout, int height, Shrinking shrinking) {
                         shrinking == Shrinking::Yes ? QSizePolicy::Maximum : QSizePolicy::Fixed));
 }
 
-/// Adds a widget, and makes it the layout's widget's child. It is `height` pixels high, or as high as its text
-/// needs. With `aroundText` it grows lower where the window is too low, but keeps that many pixels
-/// more than its font's height.
+/// Adds a widget, and makes it the layout's widget's child. It is `height` pixels high, or as high
+/// as its text needs. With `aroundText` it grows lower where the window is too low, but keeps that
+/// many pixels more than its font's height.
 void addOfHeight(QBoxLayout *layout, QWidget *widget, int height,
                  std::optional<int> aroundText = std::nullopt);
 
@@ -33,8 +33,8 @@ inline QVBoxLayout *newPageLayout(QWidget *page) {
     return layout;
 }
 
-/// The rows of a group, from the first one's upper edge to the last one's lower: a layout of its own
-/// between the group's borders, without spacing when it shrinks.
+/// The rows of a group, from the first one's upper edge to the last one's lower: a layout of its
+/// own between the group's borders, without spacing when it shrinks.
 inline QVBoxLayout *newGroupRows(QGroupBox *group, Shrinking shrinking = Shrinking::No) {
     auto *layout = new QVBoxLayout(group);
     auto *rows = new QVBoxLayout;

@@ -91,6 +91,16 @@ QDialog *mainDialog() {
     return nullptr;
 }
 
+/// Where the help is shown; null until it was asked for.
+QTextBrowser *help() {
+    for (QWidget *widget : QApplication::topLevelWidgets()) {
+        if (auto *browser = widget->findChild<QTextBrowser *>()) {
+            return browser;
+        }
+    }
+    return nullptr;
+}
+
 QWidget *page(const char *name) { return mainDialog()->findChild<KConfigWidget *>(name); }
 
 } // namespace
@@ -202,18 +212,73 @@ private slots:
         QCOMPARE(alias_list.head->address, std::string{"ann"});
     }
 
+    void captionsLettersReachTheirFields() {
+        auto *tabs = mainDialog()->findChild<QTabWidget *>();
+        QStringList pressed;
+        for (int tab = 0; tab < tabs->count(); ++tab) {
+            tabs->setCurrentIndex(tab);
+            for (const QLabel *label : tabs->widget(tab)->findChildren<QLabel *>()) {
+                const QKeySequence letter = QKeySequence::mnemonic(label->text());
+                // The second press comes from another field, as a user's would.
+                for (int press = 0; !letter.isEmpty() && press < 2; ++press) {
+                    tabs->setFocus();
+                    QTest::keySequence(mainDialog(), letter);
+                    QCOMPARE(tabs->currentIndex(), tab);
+                    QVERIFY2(label->buddy()->hasFocus(), qPrintable(label->text()));
+                    pressed << letter.toString();
+                }
+            }
+        }
+        QCOMPARE(pressed.size(), 2 * (6 + 5 + 5 + 7));
+        QTest::keyClick(mainDialog(), Qt::Key_S, Qt::AltModifier);
+        QCOMPARE(tabs->currentIndex(), 0);
+    }
+
     void helpShowsThePageOrSaysThatItIsMissing() {
         mainDialog()->findChild<QTabWidget *>()->setCurrentIndex(1);
         QTest::keyClick(mainDialog(), Qt::Key_F1);
-        auto *browser = mainDialog()->findChild<QTextBrowser *>();
-        QVERIFY(browser != nullptr && browser->isVisible());
-        QVERIFY(browser->toPlainText().contains("pop.sock.port"));
-        const fs::path installed = QCoreApplication::applicationDirPath().toStdString() +
-                                   "/../share/kcmtarvex_mail/help/en/tarvex-mail-pop3.html";
+        QVERIFY(help() != nullptr && help()->isVisible());
+        QVERIFY(help()->toPlainText().contains("pop.sock.port"));
+        QCOMPARE(help()->window()->windowTitle(), "POP3");
+        const QString file = KApplication::shared("kcmtarvex_mail/help/en/tarvex-mail-pop3.html");
+        const fs::path installed = file.toStdString();
         fs::rename(installed, product / "away");
         press(mainDialog(), "Help");
         fs::rename(product / "away", installed);
-        QVERIFY(browser->toPlainText().contains("\"tarvex-mail-pop3.html\" is not installed"));
+        QVERIFY(help()->toPlainText().contains("\"tarvex-mail-pop3.html\" is not installed"));
+    }
+
+    void helpLeadsToHelpFilesOnly() {
+        using Case = std::pair<const char *, const char *>;
+        for (const auto &[link, title] :
+             std::initializer_list<Case>{{"tarvex-mail-imap.html", "IMAP"},
+                                         {"tarvex-mail-smtp.html#access", "SMTP"},
+                                         {"https://example.com/tarvex-mail-imap.html", "SMTP"},
+                                         {"/etc/passwd", "SMTP"},
+                                         {"../en/tarvex-mail-imap.html/", "SMTP"},
+                                         {"nothing.html", "SMTP"}}) {
+            emit help()->anchorClicked(help()->source().resolved(QUrl{link}));
+            QCOMPARE(help()->window()->windowTitle(), title);
+        }
+    }
+
+    /// Clicks reach a window only where no modal dialog is in their way.
+    void helpIsUsableWhileADialogIsOpen() {
+        help()->window()->hide();
+        mainDialog()->findChild<QTabWidget *>()->setCurrentIndex(5);
+        QVERIFY(withDialog([] { press(page("alias"), "Add..."); },
+                           [](QWidget *dialog) {
+                               QTRY_COMPARE(QApplication::activeWindow(), dialog);
+                               QTest::keyClick(dialog, Qt::Key_F1);
+                               QVERIFY(help()->isVisible());
+                               QCOMPARE(help()->window()->windowTitle(), "Aliasing");
+                               const QWidget *close =
+                                   captioned(help()->window(), &QAbstractButton::text, "Close");
+                               QTest::mouseClick(help()->window()->windowHandle(), Qt::LeftButton,
+                                                 {}, close->geometry().center());
+                               QVERIFY(!help()->isVisible());
+                               press(dialog, "Cancel");
+                           }));
     }
 
     void cancelAndEscapeWriteNothing() {
@@ -252,6 +317,11 @@ private slots:
         QTest::newRow("unknown page")
             << QStringList{"-init", "alias", "smtp"} << 2
             << "kcmtarvex_mail: unknown page \"smtp\"; the pages are " + names + "\n";
+        QTest::newRow("unknown option")
+            << QStringList{"-init", "-x"} << 2 << "kcmtarvex_mail: Unknown option 'x'.\n";
+        QTest::newRow("version") << QStringList{"-v"} << 0 << "kcmtarvex_mail 1.0.0\n";
+        QTest::newRow("no display")
+            << QStringList{} << 1 << "kcmtarvex_mail: no display can be opened\n";
     }
 
     /// On a display that is not there.

@@ -1,0 +1,282 @@
+#include "alias/editalias.h"
+#include "alias/editaliasentry.h"
+#include "alias/mailalias.h"
+#include "fetch/editfetch.h"
+#include "fetch/mailfetch.h"
+#include "lists/editlist.h"
+#include "lists/editlistaddr.h"
+#include "lists/editlistmember.h"
+#include "lists/listload.h"
+#include "lists/listsearch.h"
+#include "lists/maillist.h"
+#include "platform/kcontroldialog.h"
+#include "server/editsmtp.h"
+#include "server/maildebatch.h"
+#include "server/mailimap.h"
+#include "server/mailpop3.h"
+#include "server/mailsmtp.h"
+
+#include "dialogdriver.h"
+
+#include <QAccessible>
+#include <QComboBox>
+#include <QGroupBox>
+#include <QPushButton>
+#include <QScreen>
+#include <QScrollArea>
+#include <QSpinBox>
+#include <QStyleOptionButton>
+#include <QTabWidget>
+#include <QToolTip>
+
+#include <memory>
+
+namespace {
+
+using Window = std::unique_ptr<QWidget>;
+
+template <class Dialog>
+Window empty() {
+    if constexpr (std::is_constructible_v<Dialog, QWidget *, const char *, std::nullptr_t>) {
+        return std::make_unique<Dialog>(nullptr, "Edit", nullptr);
+    } else {
+        return std::make_unique<Dialog>(nullptr, "page");
+    }
+}
+
+constexpr std::array makers{
+    empty<MailSMTP>,     empty<MailPOP3>,       empty<MailIMAP>,       empty<MailFetch>,
+    empty<MailDebatch>,  empty<MailAlias>,      empty<MailList>,       empty<EditSMTP>,
+    empty<EditFetch>,    empty<EditAlias>,      empty<EditAliasEntry>, empty<EditList>,
+    empty<EditListAddr>, empty<EditListMember>, empty<ListSearch>,     empty<ListLoad>};
+
+/// What a user reads or works with, as opposed to what only holds others.
+QList<QWidget *> partsOf(const QWidget *window) {
+    QList<QWidget *> parts = window->findChildren<QWidget *>();
+    parts.removeIf([](const QWidget *part) {
+        const bool isPart = qobject_cast<const QLabel *>(part) != nullptr ||
+                            qobject_cast<const QLineEdit *>(part) != nullptr ||
+                            qobject_cast<const QAbstractButton *>(part) != nullptr ||
+                            qobject_cast<const QComboBox *>(part) != nullptr ||
+                            qobject_cast<const QAbstractSpinBox *>(part) != nullptr ||
+                            qobject_cast<const QListBox *>(part) != nullptr;
+        return !isPart || !part->isVisible() ||
+               qobject_cast<const QAbstractSpinBox *>(part->parentWidget()) != nullptr;
+    });
+    return parts;
+}
+
+QRect placeOf(const QWidget *part) {
+    return {part->mapTo(part->window(), QPoint{0, 0}), part->size()};
+}
+
+QString described(const QWidget *part) {
+    return part->metaObject()->className() + QStringLiteral(" ") +
+           part->property("text").toString() + QStringLiteral(" in ") +
+           part->window()->metaObject()->className();
+}
+
+/// The room that a part gives its text, and what the text needs.
+std::pair<QSize, QSize> roomAndText(const QWidget *part) {
+    if (const auto *box = qobject_cast<const QSpinBox *>(part)) {
+        const int digits = box->fontMetrics().horizontalAdvance(QString::number(box->maximum()));
+        return {box->findChild<QLineEdit *>()->size(), {digits + 5, box->fontMetrics().height()}};
+    }
+    const QFontMetrics metrics = part->fontMetrics();
+    const QSize text{metrics.size(Qt::TextShowMnemonic, part->property("text").toString()).width(),
+                     metrics.height()};
+    if (qobject_cast<const QPushButton *>(part) != nullptr) {
+        QStyleOptionButton option;
+        option.initFrom(part);
+        return {part->style()->subElementRect(QStyle::SE_PushButtonContents, &option, part).size(),
+                text};
+    }
+    return {part->size(),
+            qobject_cast<const QLabel *>(part) != nullptr ? text : QSize{0, text.height()}};
+}
+
+/// The first fault of the window's layout; empty when there is none.
+QString layoutFault(const QWidget *window) {
+    const QList<QWidget *> parts = partsOf(window);
+    for (const QWidget *part : parts) {
+        const auto &[room, text] = roomAndText(part);
+        if (text.expandedTo(room) != room) {
+            return described(part) + " is cut";
+        }
+        if (!window->rect().contains(placeOf(part))) {
+            return described(part) + " is outside";
+        }
+        for (const QWidget *other : parts) {
+            if (other != part && placeOf(other).intersects(placeOf(part))) {
+                return described(part) + " overlaps " + described(other);
+            }
+        }
+    }
+    return {};
+}
+
+} // namespace
+
+class TestWindows : public QObject {
+    Q_OBJECT
+
+private slots:
+    void init() { setFont(10); }
+
+    void nothingIsCut() {
+        for (const int pixels : {10, 12, 15, 19}) {
+            setFont(pixels);
+            for (const auto make : makers) {
+                const Window window = make();
+                window->show();
+                QVERIFY2(layoutFault(window.get()).isEmpty(),
+                         qPrintable(QString::number(pixels) + layoutFault(window.get())));
+            }
+        }
+    }
+
+    void fieldsOfAFormBeginAtOneX() {
+        for (const int pixels : {10, 19}) {
+            setFont(pixels);
+            for (const auto make : {empty<MailSMTP>, empty<MailDebatch>, empty<EditFetch>}) {
+                const Window window = make();
+                window->show();
+                QList<int> left;
+                for (const QLabel *label : window->findChildren<QLabel *>()) {
+                    if (label->text().contains('&')) {
+                        left << placeOf(label->buddy()).left();
+                    }
+                }
+                QCOMPARE(left.count(left.first()), left.size());
+            }
+        }
+    }
+
+    /// With a small font all given numbers hold: dialog, then top and bottom of each row, then the
+    /// right edges of the last field and of "Cancel".
+    void measuresOfDialogs() {
+        struct Case {
+            Window window;
+            QString measures;
+        };
+        Case cases[]{{empty<EditSMTP>(), "300x70 0-25 40-70 290 290"},
+                     {empty<EditFetch>(), "250x140 10-35 40-65 70-95 110-140 240 240"},
+                     {empty<EditAlias>(), "350x210 5-30 180-210 340 340"},
+                     {empty<EditAliasEntry>(), "350x100 5-30 35-60 70-100 340 340"},
+                     {empty<EditListAddr>(), "350x80 5-30 50-80 340 340"},
+                     {empty<EditListMember>(), "350x100 5-30 40-60 70-100 340 340"},
+                     {empty<ListSearch>(), "350x80 5-30 50-80 340 340"},
+                     {empty<ListLoad>(), "350x80 5-30 50-80 340 340"}};
+        for (const auto &[window, measures] : cases) {
+            window->show();
+            QMap<int, QString> rows;
+            int right = 0;
+            for (const QWidget *part : partsOf(window.get())) {
+                const bool isInList = qobject_cast<QGroupBox *>(part->parentWidget()) != nullptr;
+                if (qobject_cast<const QLabel *>(part) == nullptr && !isInList) {
+                    const QRect place = placeOf(part);
+                    rows[place.top()] = QString("%1-%2").arg(place.top()).arg(place.bottom() + 1);
+                    if (place.bottom() < 100 && place.top() < 31) {
+                        right = std::max(right, place.right() + 1);
+                    }
+                }
+            }
+            const QWidget *cancel = captioned(window.get(), &QAbstractButton::text, "Cancel");
+            QCOMPARE(QString("%1x%2 %3 %4 %5")
+                         .arg(window->width())
+                         .arg(window->height())
+                         .arg(QStringList{rows.values()}.join(' '))
+                         .arg(right)
+                         .arg(placeOf(cancel).right() + 1),
+                     measures);
+        }
+    }
+
+    /// From high to low: nothing overlaps, and no row gives way by more than what is missing.
+    void editorShrinksByWhatIsMissing() {
+        const Window editor = empty<EditList>();
+        editor->show();
+        QMap<QWidget *, int> heights;
+        for (int height = 800; height >= 350; --height) {
+            editor->resize(600, height);
+            QVERIFY2(layoutFault(editor.get()).isEmpty(), qPrintable(layoutFault(editor.get())));
+            for (QWidget *part : partsOf(editor.get())) {
+                const int before = heights.value(part, part->height());
+                QVERIFY2(before - part->height() <= 1, qPrintable(described(part)));
+                heights[part] = part->height();
+            }
+        }
+        QCOMPARE(editor->size(), QSize(600, 350));
+        QVERIFY(fieldBeside(editor.get(), "&Mail list Name:")->height() < 25);
+    }
+
+    /// Here the screen is 800 pixels high.
+    void lowScreen() {
+        setFont(40);
+        KControlDialog dialog;
+        dialog.addPage(new MailSMTP(&dialog, "smtpserver"), "&SMTP", {});
+        dialog.addPage(new MailIMAP(&dialog, "imapserver"), "&IMAP", {});
+        dialog.addButtons();
+        const Window editor = empty<EditList>();
+        for (QWidget *window : {editor.get(), static_cast<QWidget *>(&dialog)}) {
+            window->show();
+            QVERIFY(window->height() <= window->screen()->availableGeometry().height());
+            const QWidget *ok = captioned(window, &QAbstractButton::text, "OK");
+            QVERIFY(window->rect().contains(placeOf(ok)));
+            QVERIFY(window->findChild<QScrollArea *>() != nullptr);
+        }
+        QCOMPARE(dialog.findChild<QTabWidget *>()->count(), 2);
+        QCOMPARE(dialog.findChild<QTabWidget *>()->tabText(1), "&IMAP");
+        setFont(10);
+        KControlDialog small;
+        small.addPage(new MailSMTP(&small, "smtpserver"), "&SMTP", {});
+        small.addButtons();
+        QVERIFY(small.findChild<QScrollArea *>() == nullptr);
+    }
+
+    void refusalCoversNoField() {
+        for (const auto make : {empty<EditFetch>, empty<EditAlias>, empty<EditAliasEntry>}) {
+            const Window window = make();
+            for (const QPoint at : {QPoint{10, 40}, QPoint{500, 40}, QPoint{500, 580}}) {
+                window->move(at);
+                window->show();
+                QTest::keyClicks(window->findChild<QLineEdit *>(), ",");
+                const auto widgets = QApplication::topLevelWidgets();
+                const auto tip = std::ranges::find_if(widgets, [](const QWidget *widget) {
+                    return widget->inherits("QTipLabel") && widget->isVisible();
+                });
+                QVERIFY(tip != widgets.end());
+                QVERIFY(!(*tip)->geometry().intersects(window->geometry()));
+                QToolTip::hideText();
+                QTRY_VERIFY(!(*tip)->isVisible());
+            }
+        }
+    }
+
+    /// As a screen reader gets them: what has no name, or another one's, is lost on its user.
+    void namesForScreenReaders() {
+        for (const auto make : makers) {
+            const Window window = make();
+            window->show();
+            QStringList names;
+            for (QWidget *part : partsOf(window.get())) {
+                if (qobject_cast<QLabel *>(part) == nullptr) {
+                    const auto *interface = QAccessible::queryAccessibleInterface(part);
+                    names << interface->text(QAccessible::Name);
+                    QVERIFY2(!names.last().isEmpty(), qPrintable(described(part)));
+                }
+            }
+            QCOMPARE(names.removeDuplicates(), 0);
+        }
+    }
+
+private:
+    static void setFont(int pixels) {
+        QFont font = QApplication::font();
+        font.setPixelSize(pixels);
+        QApplication::setFont(font);
+    }
+};
+
+QTEST_MAIN(TestWindows)
+#include "test_windows.moc"
