@@ -3,7 +3,10 @@
 #include "dialogdriver.h"
 
 #include <QDialog>
+#include <QHelpEvent>
 #include <QPushButton>
+#include <QScrollBar>
+#include <QToolTip>
 
 namespace {
 
@@ -65,6 +68,37 @@ private slots:
         QVERIFY(window.selected.empty());
         QVERIFY(window.dialog.isVisible());
         QCOMPARE(window.current(), "-1");
+    }
+
+    void focusIsSeen() {
+        for (const std::vector<std::string> &rows : {std::vector<std::string>{}, {"a", "b"}}) {
+            Window window{-1, rows};
+            QVERIFY(QTest::qWaitForWindowActive(&window.dialog));
+            window.ok->setFocus();
+            const QImage without = window.box->viewport()->grab().toImage();
+            window.box->setFocus();
+            QVERIFY(window.box->viewport()->grab().toImage() != without);
+        }
+    }
+
+    void addedRowIsSeenButNotChosen() {
+        Window window{0, std::vector<std::string>(100, "x")};
+        window.box->append(std::string{"new"});
+        QVERIFY(window.box->viewport()->rect().contains(centreOfRow(window.box, 100)));
+        QCOMPARE(window.current(), "0");
+    }
+
+    void onlyALongRowHasAToolTip() {
+        Window window{-1, {"a", std::string(200, 'x'), "a<b>" + std::string(200, 'x')}};
+        using Case = std::pair<int, QString>;
+        for (const auto &[row, tip] :
+             {Case{1, QString(200, 'x')}, Case{0, ""}, Case{2, "a&lt;b&gt;" + QString(200, 'x')}}) {
+            const QPoint at = centreOfRow(window.box, row);
+            QHelpEvent event{QEvent::ToolTip, at, window.box->viewport()->mapToGlobal(at)};
+            QApplication::sendEvent(window.box->viewport(), &event);
+            QTRY_COMPARE(QToolTip::text(), tip);
+        }
+        QVERIFY(window.box->horizontalScrollBar()->maximum() == 0);
     }
 
     void mouse() {

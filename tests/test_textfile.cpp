@@ -54,6 +54,14 @@ private slots:
         close(reader);
     }
 
+    /// Rights are not what stops the tests' user; a folder that is not there is.
+    void foretellsWhetherAFileCanBeWritten() {
+        QVERIFY(mayRewrite(folder + "/new") &&
+                !QFile::exists(QString::fromStdString(folder + "/new")));
+        QVERIFY(rewriteFile(file, "x") && mayRewrite(file) && readWholeFile(file) == "x");
+        QVERIFY(!mayRewrite(folder + "/no/new") && !mayRewrite(file + "/new") && !mayRewrite(""));
+    }
+
     void linksAndModeStay() {
         const std::string link = folder + "/link";
         QVERIFY(rewriteFile(file, "a longer text") && chmod(file.c_str(), 0640) == 0);
