@@ -1,3 +1,4 @@
+# shellcheck shell=bash
 # Completes the page names and options of kcmtarvex_mail and kcmtarvex_mail-admin. A page that the
 # line names already is not offered again.
 _kcmtarvex_mail()
