@@ -1,8 +1,10 @@
 #include "alias/aliasfile.h"
+#include "alias/editaliasentry.h"
 #include "alias/mailalias.h"
 #include "config/settings.h"
 #include "fetch/mailfetch.h"
 #include "fetch/pophosts.h"
+#include "lists/listload.h"
 #include "lists/maillist.h"
 #include "lists/maillistfile.h"
 #include "server/mailsmtp.h"
@@ -11,8 +13,10 @@
 #include "dialogdriver.h"
 
 #include <QComboBox>
+#include <QFileDialog>
 #include <QGroupBox>
 #include <QMessageBox>
+#include <QTemporaryDir>
 #include <QTemporaryFile>
 
 #include <memory>
@@ -249,6 +253,34 @@ private slots:
                 press(editor, test.button);
             }));
             QCOMPARE(stored(), test.after);
+        }
+    }
+
+    /// The choosers begin in the folder that the field names.
+    void browse() {
+        const QTemporaryDir folder;
+        QDir{folder.path()}.mkdir("in");
+        QFile file{folder.filePath("in/file")};
+        QVERIFY(file.open(QIODevice::WriteOnly));
+        const EditAliasEntry target{nullptr, "edit", nullptr};
+        const ListLoad load{nullptr, "load"};
+        using Case = std::tuple<const QDialog *, const char *, QString, const char *>;
+        for (const auto &[dialog, caption, chosen, name] :
+             {Case{&target, "&Alias:", "in", "browse"}, Case{&load, "&Filename:", "in/file", "QFileDialog"}}) {
+            QLineEdit *field = fieldBeside(dialog, caption);
+            field->setText(folder.path());
+            for (const bool isAccepted : {false, true}) {
+                QVERIFY(withDialog([&] { press(dialog, "Browse..."); },
+                                   [&](QWidget *window) {
+                                       auto *chooser = qobject_cast<QFileDialog *>(window);
+                                       QCOMPARE(chooser->objectName(), name);
+                                       QVERIFY(
+                                           chooser->directory().path().startsWith(folder.path()));
+                                       chooser->selectFile(folder.filePath(chosen));
+                                       static_cast<QDialog *>(chooser)->done(isAccepted ? 1 : 0);
+                                   }));
+                QCOMPARE(field->text(), isAccepted ? folder.filePath(chosen) : folder.path());
+            }
         }
     }
 

@@ -2,7 +2,6 @@
 
 #include <QApplication>
 #include <QDir>
-#include <QIcon>
 #include <QLibraryInfo>
 #include <QTranslator>
 
@@ -90,8 +89,6 @@ KApplication::KApplication(const char *program, const char *name, bool hasDispla
         toolkitTexts_ = toolkitTexts();
         QCoreApplication::installTranslator(toolkitTexts_.get());
         QGuiApplication::setDesktopFileName(name);
-        QGuiApplication::setWindowIcon(
-            QIcon{shared(QStringLiteral("icons/hicolor/48x48/apps/%1.png").arg(name))});
     }
 }
 

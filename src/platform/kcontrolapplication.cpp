@@ -6,6 +6,8 @@
 #include <QApplication>
 #include <QCommandLineParser>
 #include <QFile>
+#include <QIcon>
+#include <QTimer>
 
 #include <algorithm>
 #include <cstdio>
@@ -123,4 +125,8 @@ void KControlApplication::setNote(const QString &text) { dialog_->setNote(text);
 void KControlApplication::showDialog() {
     dialog_->addButtons();
     dialog_->show();
+    // To read a picture the toolkit looks through its plugins: time that the window need not wait.
+    QTimer::singleShot(0, dialog_.get(), [file = shared("icons/hicolor/48x48/apps/" + name())] {
+        QGuiApplication::setWindowIcon(QIcon{file + ".png"});
+    });
 }

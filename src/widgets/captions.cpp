@@ -29,10 +29,13 @@ QLabel *CaptionColumn::newCaption(const QString &caption, QWidget *field) {
     if (size.height() > 0) {
         label->setFixedHeight(size.height());
     }
+    label->setFixedWidth(size.width());
     labels_.push_back(label);
-    least_.setWidth(size.width());
-    for (QLabel *above : labels_) {
-        above->setFixedWidth(size.width());
+    if (size.width() > least_.width()) {
+        least_.setWidth(size.width());
+        for (QLabel *above : labels_) {
+            above->setFixedWidth(size.width());
+        }
     }
     return label;
 }

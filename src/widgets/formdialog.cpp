@@ -26,6 +26,7 @@ bool isWholePath(const QString &path) {
 }
 
 void browse(QLineEdit *field, QFileDialog &chooser) {
+    chooser.setWindowModality(Qt::WindowModal); // The help stays usable here as well.
     if (field->isReadOnly() || chooser.exec() != QDialog::Accepted) {
         return;
     }

@@ -32,7 +32,7 @@ QSize forNumbers(const QSpinBox *box, QSize given) {
     QStyleOptionSpinBox option;
     option.initFrom(box);
     option.frame = box->hasFrame();
-    option.rect = {{}, given.expandedTo(box->sizeHint())};
+    option.rect = {{}, QSize{given.width(), 2 * box->fontMetrics().height()}};
     const int room =
         box->style()
             ->subControlRect(QStyle::CC_SpinBox, &option, QStyle::SC_SpinBoxEditField, box)
@@ -41,7 +41,8 @@ QSize forNumbers(const QSpinBox *box, QSize given) {
         return box->fontMetrics().size(0, QString::number(number)).width();
     };
     const int text = std::max(widthOf(box->minimum()), widthOf(box->maximum()));
-    return {option.rect.width() - room + editMargins + text, box->minimumSizeHint().height()};
+    return {given.width() - room + editMargins + text,
+            given.height() == 0 ? 0 : box->minimumSizeHint().height()};
 }
 
 QSize needed(const QWidget *widget, QSize given) {
