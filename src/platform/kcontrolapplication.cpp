@@ -7,7 +7,7 @@
 #include <QCommandLineParser>
 #include <QFile>
 #include <QIcon>
-#include <QTimer>
+#include <QWindow>
 
 #include <algorithm>
 #include <cstdio>
@@ -125,8 +125,12 @@ void KControlApplication::setNote(const QString &text) { dialog_->setNote(text);
 void KControlApplication::showDialog() {
     dialog_->addButtons();
     dialog_->show();
-    // To read a picture the toolkit looks through its plugins: time that the window need not wait.
-    QTimer::singleShot(0, dialog_.get(), [file = shared("icons/hicolor/48x48/apps/" + name())] {
-        QGuiApplication::setWindowIcon(QIcon{file + ".png"});
-    });
+    // To read a picture the toolkit looks through its plugins: time that the window need not wait
+    // for. It has been mapped when it gets the focus.
+    QObject::connect(
+        qGuiApp, &QGuiApplication::focusWindowChanged, dialog_.get(),
+        [file = shared("icons/hicolor/48x48/apps/" + name())] {
+            QGuiApplication::setWindowIcon(QIcon{file + ".png"});
+        },
+        Qt::SingleShotConnection);
 }
