@@ -1,5 +1,7 @@
 #include "platform/helpwindow.h"
 
+#include "platform/lowscreen.h"
+
 #include <QCoreApplication>
 #include <QFileInfo>
 #include <QLocale>
@@ -28,7 +30,7 @@ HelpWindow::HelpWindow(QString folder)
     : folder_{std::move(folder)}, browser_{new QTextBrowser(this)} {
     const QString help = QCoreApplication::translate("QPlatformTheme", "Help");
     setWindowTitle(help);
-    resize(640, 560);
+    resize(QSize{640, 560}.boundedTo(roomFor(this)));
     browser_->setAccessibleName(help);
     browser_->setOpenLinks(false);
     auto *close = new QPushButton(QCoreApplication::translate("QPlatformTheme", "Close"), this);

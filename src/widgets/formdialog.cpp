@@ -1,6 +1,7 @@
 #include "widgets/formdialog.h"
 
 #include "platform/helpkey.h"
+#include "platform/lowscreen.h"
 #include "widgets/fieldrule.h"
 #include "widgets/fieldtext.h"
 #include "widgets/leastsize.h"
@@ -26,6 +27,7 @@ bool isWholePath(const QString &path) {
 }
 
 void browse(QLineEdit *field, QFileDialog &chooser) {
+    chooser.resize(chooser.sizeHint().boundedTo(roomFor(&chooser)));
     chooser.setWindowModality(Qt::WindowModal); // The help stays usable here as well.
     if (field->isReadOnly() || chooser.exec() != QDialog::Accepted) {
         return;
