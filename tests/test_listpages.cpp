@@ -266,7 +266,8 @@ private slots:
         const ListLoad load{nullptr, "load"};
         using Case = std::tuple<const QDialog *, const char *, QString, const char *>;
         for (const auto &[dialog, caption, chosen, name] :
-             {Case{&target, "&Alias:", "in", "browse"}, Case{&load, "&Filename:", "in/file", "QFileDialog"}}) {
+             {Case{&target, "&Alias:", "in", "browse"},
+              Case{&load, "&Filename:", "in/file", "QFileDialog"}}) {
             QLineEdit *field = fieldBeside(dialog, caption);
             field->setText(folder.path());
             for (const bool isAccepted : {false, true}) {

@@ -39,7 +39,7 @@ int entryShownFor(std::uint8_t type) {
 } // namespace
 
 EditAliasEntry::EditAliasEntry(QWidget *parent, const char *name, const alias_list_entry *target)
-    : FormDialog(parent, name, "Address Alias"), type_{new QComboBox(this)} {
+    : FormDialog(parent, name, "Address Alias") {
     QHBoxLayout *aliasRow = addRow();
     CaptionColumn aliasCaption{{40, 18}};
     alias_ = addField(aliasRow, translatable("&Alias:"), aliasCaption,
@@ -48,6 +48,8 @@ EditAliasEntry::EditAliasEntry(QWidget *parent, const char *name, const alias_li
     connect(addBrowseButton(aliasRow, 70, translatable("&Alias:")), &QPushButton::clicked, this,
             &EditAliasEntry::browse);
 
+    type_ =
+        new QComboBox(this); // Behind the field, so that Tab and the first focus go there first.
     type_->setObjectName("Alias Type");
     for (const TypeEntry &entry : typeEntries) {
         type_->addItem(QString::fromUtf8(entry.caption));

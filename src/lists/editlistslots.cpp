@@ -5,10 +5,12 @@
 #include "lists/editlistmember.h"
 #include "lists/listload.h"
 #include "lists/listsearch.h"
+#include "platform/helpkey.h"
 #include "widgets/recordrows.h"
 
 #include <QLineEdit>
 #include <QMessageBox>
+#include <QPushButton>
 
 #include <new>
 
@@ -29,6 +31,17 @@ std::optional<int> nextRowHolding(const QListBox *box, const std::string &needle
         }
     }
     return std::nullopt;
+}
+
+void showUnreadable(QWidget *editor) {
+    QMessageBox message{
+        QMessageBox::Information, QStringLiteral("Mailling List Manager"),
+        QStringLiteral("Could not open file for reading - perhaps permission denied?.\n\n"),
+        QMessageBox::Ok, editor};
+    message.button(QMessageBox::Ok)->setText(QStringLiteral("OK"));
+    message.setWindowModality(Qt::WindowModal); // The help stays usable.
+    addHelpKey(&message);
+    message.exec();
 }
 
 void readMember(EditList * /*editor*/, maillist_addr_entry *entry, EditListMember *dialog) {
@@ -120,10 +133,7 @@ void EditList::Load(QListBox *box, maillist_addr_entry **chain) {
     try {
         const std::optional<std::string> bytes = readWholeFile(dialog.fileName());
         if (!bytes) {
-            QMessageBox::information(
-                this, QStringLiteral("Mailling List Manager"),
-                QStringLiteral(
-                    "Could not open file for reading - perhaps permission denied?.\n\n"));
+            showUnreadable(this);
             return;
         }
         rows = parseAddressLines(*bytes);
@@ -136,6 +146,9 @@ void EditList::Load(QListBox *box, maillist_addr_entry **chain) {
     box->setUpdatesEnabled(false);
     prependChain(chain, std::move(loaded));
     box->append(std::move(rows));
+    if (box->count() > 0) {
+        box->showRow(box->count() - 1);
+    }
     box->setUpdatesEnabled(true);
 }
 

@@ -5,6 +5,7 @@
 #include <QLibraryInfo>
 #include <QTranslator>
 
+#include <clocale>
 #include <cstdio>
 #include <cstdlib>
 #include <utility>
@@ -47,9 +48,14 @@ private:
 
 /// The toolkit's own texts in the user's language; null where there are none or none are needed.
 std::unique_ptr<QTranslator> toolkitTexts() {
+    // In this locale the program's own messages are not translated either.
+    const std::string_view messages = std::setlocale(LC_MESSAGES, nullptr);
+    if (messages == "C" || messages == "POSIX") {
+        return nullptr;
+    }
     const QLocale locale = QLocale::system();
     const QString firstLanguage = locale.uiLanguages().value(0);
-    if (firstLanguage == "C" || firstLanguage.startsWith("en")) {
+    if (firstLanguage.startsWith("en")) {
         return nullptr;
     }
     auto texts = std::make_unique<QTranslator>();

@@ -129,8 +129,11 @@ void KControlApplication::showDialog() {
     // for. It has been mapped when it gets the focus.
     QObject::connect(
         qGuiApp, &QGuiApplication::focusWindowChanged, dialog_.get(),
-        [file = shared("icons/hicolor/48x48/apps/" + name())] {
-            QGuiApplication::setWindowIcon(QIcon{file + ".png"});
+        [folder = shared("icons/hicolor/%1x%1/apps/" + name() + ".png")] {
+            QIcon icon;
+            icon.addFile(folder.arg(48));
+            icon.addFile(folder.arg(128));
+            QGuiApplication::setWindowIcon(icon);
         },
         Qt::SingleShotConnection);
 }

@@ -2,12 +2,14 @@
 
 #include <QLineEdit>
 #include <QSignalBlocker>
+#include <QWheelEvent>
 
 #include <algorithm>
 
 KNumericSpinBox::KNumericSpinBox(QWidget *parent) : QSpinBox(parent) {
     // Some languages' digits or separators would show a stored number other than it is.
     setLocale(QLocale::c());
+    setFocusPolicy(Qt::StrongFocus); // The wheel does not give the focus.
     connect(this, &QSpinBox::valueChanged, this, &KNumericSpinBox::confine);
 }
 
@@ -35,6 +37,15 @@ void KNumericSpinBox::setValue(int value) {
 int KNumericSpinBox::getValue() const { return value(); }
 
 void KNumericSpinBox::setEditable(bool editable) { lineEdit()->setReadOnly(!editable); }
+
+void KNumericSpinBox::wheelEvent(QWheelEvent *event) {
+    // A page is scrolled over its fields without changing them.
+    if (hasFocus()) {
+        QSpinBox::wheelEvent(event);
+    } else {
+        event->ignore();
+    }
+}
 
 void KNumericSpinBox::confine(int value) {
     if (value != stored_) {

@@ -3,7 +3,8 @@
 #include <QSpinBox>
 
 /// A field for a whole number. A stored value outside the range is shown as it is and given back
-/// unchanged until the user changes it; whatever the user enters is inside the range.
+/// unchanged until the user changes it; whatever the user enters is inside the range. The wheel
+/// changes it only when it has the focus.
 class KNumericSpinBox : public QSpinBox {
     Q_OBJECT
 
@@ -17,6 +18,9 @@ public:
     [[nodiscard]] int getValue() const;
     /// Whether the number can be typed, rather than only stepped.
     void setEditable(bool editable);
+
+protected:
+    void wheelEvent(QWheelEvent *event) override;
 
 private:
     void confine(int value);

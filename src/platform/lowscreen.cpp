@@ -1,5 +1,6 @@
 #include "platform/lowscreen.h"
 
+#include <QApplication>
 #include <QScreen>
 #include <QScrollArea>
 
@@ -18,6 +19,16 @@ QScrollArea *scrolling(QWidget *content) {
     auto *area = new QScrollArea(content->parentWidget());
     area->setFrameShape(QFrame::NoFrame);
     area->setWidgetResizable(true);
+    area->setFocusPolicy(Qt::NoFocus);
     area->setWidget(content);
+    // What lies behind shows through, as it does without the area.
+    content->setAutoFillBackground(false);
+    area->viewport()->setAutoFillBackground(false);
+    // The area follows the Tab key by itself, but not a caption's letter.
+    QObject::connect(qApp, &QApplication::focusChanged, area, [area](QWidget *, QWidget *now) {
+        if (now != nullptr && area->isAncestorOf(now)) {
+            area->ensureWidgetVisible(now);
+        }
+    });
     return area;
 }

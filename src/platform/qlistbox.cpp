@@ -102,7 +102,7 @@ void QListBox::append(std::string text) {
     std::vector<std::string> texts;
     texts.push_back(std::move(text));
     append(std::move(texts));
-    scrollTo(rows_->index(count() - 1));
+    showRow(count() - 1);
 }
 
 void QListBox::append(std::vector<std::string> texts) { rows_->append(std::move(texts)); }
@@ -126,6 +126,8 @@ std::optional<int> QListBox::currentRow() const {
 }
 
 void QListBox::setCurrentRow(int row) { setCurrentIndex(rows_->index(row)); }
+
+void QListBox::showRow(int row) { scrollTo(rows_->index(row)); }
 
 void QListBox::setTopRow(int row) { scrollTo(rows_->index(row), PositionAtTop); }
 
@@ -160,16 +162,23 @@ void QListBox::mouseDoubleClickEvent(QMouseEvent *event) {
 }
 
 void QListBox::paintEvent(QPaintEvent *event) {
-    QListView::paintEvent(event);
-    if (!hasFocus() || currentRow()) {
-        return; // The view shows the focus at the current row.
+    // The view shows the focus at the current row alone.
+    if (hasFocus() && !currentRow()) {
+        QStyleOptionFocusRect frame;
+        frame.initFrom(viewport());
+        frame.state |= QStyle::State_HasFocus | QStyle::State_KeyboardFocusChange;
+        frame.backgroundColor = palette().color(QPalette::Base);
+        QPainter painter{viewport()};
+        style()->drawPrimitive(QStyle::PE_FrameFocusRect, &frame, &painter, this);
     }
-    QStyleOptionFocusRect frame;
-    frame.initFrom(viewport());
-    frame.state |= QStyle::State_HasFocus | QStyle::State_KeyboardFocusChange;
-    frame.backgroundColor = palette().color(QPalette::Base);
-    QPainter painter{viewport()};
-    style()->drawPrimitive(QStyle::PE_FrameFocusRect, &frame, &painter, this);
+    QListView::paintEvent(event);
+}
+
+void QListBox::currentChanged(const QModelIndex &current, const QModelIndex &previous) {
+    QListView::currentChanged(current, previous);
+    if (current.isValid() != previous.isValid()) {
+        viewport()->update(); // The frame around all rows comes or goes.
+    }
 }
 
 bool QListBox::viewportEvent(QEvent *event) {

@@ -30,6 +30,8 @@ public:
 
     [[nodiscard]] std::optional<int> currentRow() const;
     void setCurrentRow(int row);
+    /// Scrolls as little as brings the row into sight.
+    void showRow(int row);
     /// Scrolls so that the row is the first one shown, as far as there are rows below it.
     void setTopRow(int row);
 
@@ -41,6 +43,7 @@ signals:
     void selected(const char *text);
 
 protected:
+    void currentChanged(const QModelIndex &current, const QModelIndex &previous) override;
     void focusInEvent(QFocusEvent *event) override;
     void keyPressEvent(QKeyEvent *event) override;
     void mouseDoubleClickEvent(QMouseEvent *event) override;

@@ -27,6 +27,7 @@ bool isWholePath(const QString &path) {
 }
 
 void browse(QLineEdit *field, QFileDialog &chooser) {
+    addHelpKey(&chooser);
     chooser.resize(chooser.sizeHint().boundedTo(roomFor(&chooser)));
     chooser.setWindowModality(Qt::WindowModal); // The help stays usable here as well.
     if (field->isReadOnly() || chooser.exec() != QDialog::Accepted) {
@@ -100,6 +101,9 @@ void FormDialog::addButtons(int aboveRows, int aboveButtons, Shrinking shrinking
     layout_->addLayout(rows_);
     addSpace(layout_, aboveButtons, shrinking);
     layout_->addLayout(buttons_);
+    if (shrinking == Shrinking::Yes) {
+        addSpace(layout_, pageBorder, shrinking);
+    }
     buttons_->addStretch();
     for (const auto &[caption, slot] :
          {std::pair{"OK", &QDialog::accept}, std::pair{"Cancel", &QDialog::reject}}) {

@@ -9,8 +9,8 @@
 
 namespace {
 
-/// What a line edit inside a number field keeps free on either side, and the cursor's own pixel.
-constexpr int editMargins = 2 * 2 + 1;
+/// What a line edit inside a number field keeps free before the number.
+constexpr int editMargin = 2;
 
 /// What a button that has to grow leaves free on either side of its text.
 constexpr int besideButtonText = 4;
@@ -41,7 +41,7 @@ QSize forNumbers(const QSpinBox *box, QSize given) {
         return box->fontMetrics().size(0, QString::number(number)).width();
     };
     const int text = std::max(widthOf(box->minimum()), widthOf(box->maximum()));
-    return {given.width() - room + editMargins + text,
+    return {given.width() - room + editMargin + text,
             given.height() == 0 ? 0 : box->minimumSizeHint().height()};
 }
 
