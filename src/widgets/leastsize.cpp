@@ -38,7 +38,7 @@ QSize forNumbers(const QSpinBox *box, QSize given) {
             ->subControlRect(QStyle::CC_SpinBox, &option, QStyle::SC_SpinBoxEditField, box)
             .width();
     const auto widthOf = [box](int number) {
-        return box->fontMetrics().size(0, QString::number(number)).width();
+        return box->fontMetrics().horizontalAdvance(QString::number(number));
     };
     const int text = std::max(widthOf(box->minimum()), widthOf(box->maximum()));
     return {given.width() - room + editMargin + text,
