@@ -55,14 +55,11 @@ constexpr std::array makers{
 QList<QWidget *> partsOf(const QWidget *window) {
     QList<QWidget *> parts = window->findChildren<QWidget *>();
     parts.removeIf([](const QWidget *part) {
-        const bool isPart = qobject_cast<const QLabel *>(part) != nullptr ||
-                            qobject_cast<const QLineEdit *>(part) != nullptr ||
-                            qobject_cast<const QAbstractButton *>(part) != nullptr ||
-                            qobject_cast<const QComboBox *>(part) != nullptr ||
-                            qobject_cast<const QAbstractSpinBox *>(part) != nullptr ||
-                            qobject_cast<const QListBox *>(part) != nullptr;
-        return !isPart || !part->isVisible() ||
-               qobject_cast<const QAbstractSpinBox *>(part->parentWidget()) != nullptr;
+        const auto inherits = [part](const char *name) { return part->inherits(name); };
+        constexpr std::array names{"QLabel",    "QLineEdit",        "QAbstractButton",
+                                   "QComboBox", "QAbstractSpinBox", "QListBox"};
+        return std::ranges::none_of(names, inherits) || !part->isVisible() ||
+               part->parentWidget()->inherits("QAbstractSpinBox");
     });
     return parts;
 }
@@ -72,9 +69,39 @@ QRect placeOf(const QWidget *part) {
 }
 
 QString described(const QWidget *part) {
-    return part->metaObject()->className() + QStringLiteral(" ") +
-           part->property("text").toString() + QStringLiteral(" in ") +
-           part->window()->metaObject()->className();
+    return QString{"%1 %2 in %3"}.arg(part->metaObject()->className(),
+                                      part->property("text").toString(),
+                                      part->window()->metaObject()->className());
+}
+
+/// From left to right, and from top to bottom.
+QString measured(QRect place) {
+    return QString("%1-%2 %3-%4")
+        .arg(place.left())
+        .arg(place.right() + 1)
+        .arg(place.top())
+        .arg(place.bottom() + 1);
+}
+
+/// Where a part of a dialog of fixed size is, or how wide one of fixed width; then what it tells.
+QString listed(const QWidget *part) {
+    const bool isInGroup = qobject_cast<const QGroupBox *>(part->parentWidget()) != nullptr;
+    const auto *types = qobject_cast<const QComboBox *>(part);
+    QStringList words{part->property("text").toString(), part->property("maximum").toString(),
+                      part->toolTip()};
+    for (int index = 0; types != nullptr && index < types->count(); ++index) {
+        words << types->itemText(index);
+    }
+    if (!isInGroup && types == nullptr && part->window()->maximumWidth() < QWIDGETSIZE_MAX) {
+        words.prepend(measured(placeOf(part)));
+    } else if (part->minimumWidth() == part->maximumWidth()) {
+        words.prepend(QString::number(part->width()));
+    }
+    const QString description = part->accessibleDescription();
+    words << (description == part->toolTip() && !description.isEmpty() ? "described" : description);
+    words.removeAll("");
+    return (words.isEmpty() ? part->metaObject()->className() : words.join(" | "))
+        .replace('\n', ' ');
 }
 
 /// The room that a part gives its text, and what the text needs.
@@ -124,6 +151,7 @@ class TestWindows : public QObject {
 private slots:
     void init() { setFont(10); }
 
+    /// The fields of a form begin at one x; the editor has more than one.
     void nothingIsCut() {
         for (const int pixels : {10, 12, 15, 19}) {
             setFont(pixels);
@@ -132,65 +160,39 @@ private slots:
                 window->show();
                 QVERIFY2(layoutFault(window.get()).isEmpty(),
                          qPrintable(QString::number(pixels) + layoutFault(window.get())));
-            }
-        }
-    }
-
-    void fieldsOfAFormBeginAtOneX() {
-        for (const int pixels : {10, 19}) {
-            setFont(pixels);
-            for (const auto make : {empty<MailSMTP>, empty<MailDebatch>, empty<EditFetch>}) {
-                const Window window = make();
-                window->show();
-                QList<int> left;
+                QSet<int> left;
                 for (const QLabel *label : window->findChildren<QLabel *>()) {
-                    if (label->text().contains('&')) {
-                        left << placeOf(label->buddy()).left();
-                    }
+                    left << (label->text().contains('&') ? placeOf(label->buddy()).left() : 0);
                 }
-                QCOMPARE(left.count(left.first()), left.size());
+                QVERIFY(left.subtract({0}).size() <= (window->inherits("EditList") ? 2 : 1));
             }
         }
     }
 
-    /// With a small font all given numbers hold: dialog, then top and bottom of each row, then the
-    /// right edges of the last field and of "Cancel".
-    void measuresOfDialogs() {
-        struct Case {
-            Window window;
-            QString measures;
-        };
-        Case cases[]{{empty<EditSMTP>(), "300x70 0-25 40-70 290 290"},
-                     {empty<EditFetch>(), "250x140 10-35 40-65 70-95 110-140 240 240"},
-                     {empty<EditAlias>(), "350x210 5-30 180-210 340 340"},
-                     {empty<EditAliasEntry>(), "350x100 5-30 35-60 70-100 340 340"},
-                     {empty<EditListAddr>(), "350x80 5-30 50-80 340 340"},
-                     {empty<EditListMember>(), "350x100 5-30 40-60 70-100 340 340"},
-                     {empty<ListSearch>(), "350x80 5-30 50-80 340 340"},
-                     {empty<ListLoad>(), "350x80 5-30 50-80 340 340"}};
-        for (const auto &[window, measures] : cases) {
+    /// As a list says: of each window its title, what it is divided into, and its parts. With a
+    /// small font all given measures hold.
+    void windowsAreAsListed() {
+        setFont(7);
+        QFile list{QFINDTESTDATA("windows.txt")};
+        QVERIFY(list.open(QIODevice::ReadOnly));
+        QStringList lines;
+        for (const auto make : makers) {
+            const Window window = make();
             window->show();
-            QMap<int, QString> rows;
-            int right = 0;
-            for (const QWidget *part : partsOf(window.get())) {
-                const bool isInList = qobject_cast<QGroupBox *>(part->parentWidget()) != nullptr;
-                if (qobject_cast<const QLabel *>(part) == nullptr && !isInList) {
-                    const QRect place = placeOf(part);
-                    rows[place.top()] = QString("%1-%2").arg(place.top()).arg(place.bottom() + 1);
-                    if (place.bottom() < 100 && place.top() < 31) {
-                        right = std::max(right, place.right() + 1);
-                    }
-                }
+            lines << window->metaObject()->className() + (": " + window->windowTitle());
+            if (window->maximumWidth() < QWIDGETSIZE_MAX) {
+                const auto *panel = window->findChild<QFrame *>({}, Qt::FindDirectChildrenOnly);
+                lines << measured(window->rect()) + ", panel: " + measured(panel->geometry());
             }
-            const QWidget *cancel = captioned(window.get(), &QAbstractButton::text, "Cancel");
-            QCOMPARE(QString("%1x%2 %3 %4 %5")
-                         .arg(window->width())
-                         .arg(window->height())
-                         .arg(QStringList{rows.values()}.join(' '))
-                         .arg(right)
-                         .arg(placeOf(cancel).right() + 1),
-                     measures);
+            for (const QGroupBox *group : window->findChildren<QGroupBox *>()) {
+                lines << "Group: " + group->title();
+            }
+            for (const QWidget *part : partsOf(window.get())) {
+                lines << listed(part);
+            }
+            lines << "";
         }
+        QCOMPARE(lines, QString::fromUtf8(list.readAll()).split('\n'));
     }
 
     /// From high to low: nothing overlaps, and no row gives way by more than what is missing.
@@ -226,7 +228,6 @@ private slots:
             QVERIFY(window->rect().contains(placeOf(ok)));
             QVERIFY(window->findChild<QScrollArea *>() != nullptr);
         }
-        QCOMPARE(dialog.findChild<QTabWidget *>()->count(), 2);
         QCOMPARE(dialog.findChild<QTabWidget *>()->tabText(1), "&IMAP");
         setFont(10);
         KControlDialog small;
@@ -244,9 +245,7 @@ private slots:
                 QTest::keyClicks(window->findChild<QLineEdit *>(), ",");
                 QPointer<QWidget> tip;
                 for (QWidget *widget : QApplication::topLevelWidgets()) {
-                    if (widget->inherits("QTipLabel") && widget->isVisible()) {
-                        tip = widget;
-                    }
+                    tip = widget->inherits("QTipLabel") && widget->isVisible() ? widget : tip.get();
                 }
                 QVERIFY(tip != nullptr);
                 QVERIFY(!tip->geometry().intersects(window->geometry()));
@@ -264,8 +263,7 @@ private slots:
             QStringList names;
             for (QWidget *part : partsOf(window.get())) {
                 if (qobject_cast<QLabel *>(part) == nullptr) {
-                    const auto *interface = QAccessible::queryAccessibleInterface(part);
-                    names << interface->text(QAccessible::Name);
+                    names << QAccessible::queryAccessibleInterface(part)->text(QAccessible::Name);
                     QVERIFY2(!names.last().isEmpty(), qPrintable(described(part)));
                 }
             }
