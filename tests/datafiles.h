@@ -14,11 +14,13 @@ inline char *QTest::toString(const std::string &text) {
     return QTest::toString(QByteArray::fromStdString(text));
 }
 
-inline void addRows(const std::vector<std::tuple<const char *, std::string, std::string>> &rows) {
-    QTest::addColumn<std::string>("bytes");
-    QTest::addColumn<std::string>("expected");
+/// Rows of a case's name, bytes, and what `convert` makes of them.
+template <class Convert>
+void checkRows(Convert convert,
+               const std::vector<std::tuple<const char *, std::string, std::string>> &rows) {
     for (const auto &[name, bytes, expected] : rows) {
-        QTest::newRow(name) << bytes << expected;
+        const std::string seen = convert(bytes);
+        QVERIFY2(seen == expected, (std::string{name} + ": " + seen).c_str());
     }
 }
 
@@ -27,16 +29,6 @@ inline std::string newPath() {
     std::filesystem::remove_all(TEST_PRODUCT);
     std::filesystem::create_directories(TEST_PRODUCT);
     return TEST_PRODUCT "/file";
-}
-
-/// Calls `check` with the setting at each kind of path at which no file can be read or written.
-inline void forUnusablePaths(std::optional<std::string> &setting, void (*check)()) {
-    for (const char *path : {"/", "/dev/full", "/missing/file", ""}) {
-        setting = path;
-        check();
-    }
-    setting.reset();
-    check();
 }
 
 /// Up to `longest` random bytes, high ones among them; no NUL and none of `excluded`.
