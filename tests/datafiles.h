@@ -6,22 +6,45 @@
 
 #include <algorithm>
 #include <filesystem>
+#include <fstream>
 #include <random>
-#include <tuple>
+#include <regex>
 
 template <>
 inline char *QTest::toString(const std::string &text) {
     return QTest::toString(QByteArray::fromStdString(text));
 }
 
-/// Rows of a case's name, bytes, and what `convert` makes of them.
-template <class Convert>
-void checkRows(Convert convert,
-               const std::vector<std::tuple<const char *, std::string, std::string>> &rows) {
-    for (const auto &[name, bytes, expected] : rows) {
-        const std::string seen = convert(bytes);
-        QVERIFY2(seen == expected, (std::string{name} + ": " + seen).c_str());
+/// The bytes that a text in the list of formats stands for.
+inline std::string decoded(std::string text) {
+    for (std::size_t at = 0; (at = text.find('\\', at)) != text.npos; ++at) {
+        const bool isHex = text[at + 1] == 'x';
+        const char byte = isHex ? static_cast<char>(std::stoi(text.substr(at + 2, 2), nullptr, 16))
+                                : "\n\t\r\v\f\0"[std::string_view{"ntrvf0"}.find(text[at + 1])];
+        text.replace(at, isHex ? 4 : 2, 1, byte);
     }
+    for (std::size_t at = 0; (at = text.find("x{", at)) != text.npos;) {
+        const std::size_t count = std::stoul(text.substr(at + 2));
+        text.replace(at, text.find('}', at) + 1 - at, count, 'x');
+    }
+    return text;
+}
+
+/// Checks what `convert` makes of the bytes in a section of the list of formats.
+template <class Convert>
+void checkRows(Convert convert, const char *section) {
+    std::ifstream list{QFINDTESTDATA("formats.txt").toStdString()};
+    std::string line;
+    while (line != section) {
+        QVERIFY2(std::getline(list, line), section);
+    }
+    std::smatch row;
+    const std::regex form{"(.*?): \"(.*)\" => \"(.*)\""};
+    while (std::getline(list, line) && std::regex_match(line, row, form)) {
+        const std::string seen = convert(decoded(row[2]));
+        QVERIFY2(seen == decoded(row[3]), (line + " but was " + seen).c_str());
+    }
+    QVERIFY2(line.empty(), line.c_str());
 }
 
 /// A path in the test's own product at which no file is yet.

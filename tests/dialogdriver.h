@@ -65,14 +65,14 @@ inline QString rowsOf(const QListBox *box) {
     return rows.join('|');
 }
 
-/// Does `open` and hands the modal dialog that opens to `use`, which has to close it. Whether one
-/// opened.
-template <class Open, class Use>
+/// Does `open` and hands the modal dialog of this kind that opens to `use`, which has to close it.
+/// Whether one opened.
+template <class Dialog = QWidget, class Open, class Use>
 bool withDialog(Open open, Use use) {
     const QWidget *below = QApplication::activeModalWidget();
     QTimer timer;
     QObject::connect(&timer, &QTimer::timeout, [&] {
-        QWidget *dialog = QApplication::activeModalWidget();
+        auto *dialog = qobject_cast<Dialog *>(QApplication::activeModalWidget());
         if (dialog != nullptr && dialog != below) {
             timer.stop();
             use(dialog);

@@ -1,72 +1,103 @@
 #include "alias/editalias.h"
 #include "fetch/editfetch.h"
 #include "fetch/pophosts.h"
+#include "platform/knumericspinbox.h"
 #include "widgets/fieldtext.h"
 
 #include "dialogdriver.h"
+
+#include <limits>
 
 class TestFields : public QObject {
     Q_OBJECT
 
 private slots:
+    void initTestCase() {
+        number_.setRange(0, 999);
+        number_.show();
+        QVERIFY(QTest::qWaitForWindowActive(&number_));
+    }
+
+    void textOfBytes() {
+        using Case = std::pair<const char *, std::u16string>;
+        for (const auto &[bytes, text] : {Case{"\xc3\xa9\xe2\x82\xac", u"\u00e9\u20ac"},
+                                          {"\xf0\x9f\x98\x80", u"\U0001f600"},
+                                          {"\xef\xbb\xbfx", u"\ufeffx"},
+                                          {"\xf4\x8f\xbf\xbf\xef\xbf\xbf", u"\U0010ffff\uffff"},
+                                          {"\xe2\x82|", {0xdce2, 0xdc82, '|'}},
+                                          {"\xf0\x9f\xc3\xa9", {0xdcf0, 0xdc9f, 0xe9}},
+                                          {"\xf0\x9f\x98\x80\x80", {0xd83d, 0xde00, 0xdc80}}}) {
+            QCOMPARE(textFromBytes(bytes), QStringView{text}.toString());
+            QCOMPARE(bytesFromText(text), bytes);
+        }
+        const std::u16string foreign{'a', 0xd83d, '|', 0xdc7f, 0xdd00, 0xd83d, 0xdc80};
+        QCOMPARE(bytesFromText(foreign), "a\xef\xbf\xbd|\xef\xbf\xbd\xef\xbf\xbd\xf0\x9f\x92\x80");
+    }
+
+    /// Overlong, surrogates, beyond the last code point, broken off.
+    void everyByteOfWhatIsNotValid() {
+        for (const QByteArray bytes :
+             {"\xc1\xbf", "\xe0\x9f\xbf", "\xf0\x8f\xbf\xbf", "\xed\xa0\x80", "\xed\xb2\x80",
+              "\xf4\x90\x80\x80", "\xf8\x88\x80\x80\x80", "\xf0\x9f\x98", "\x80\xbf\xfe\xff"}) {
+            QString escaped;
+            for (const char byte : bytes) {
+                escaped += QChar{0xdc00 + static_cast<unsigned char>(byte)};
+            }
+            QCOMPARE(textFromBytes(bytes.toStdString()), escaped);
+            QCOMPARE(bytesFromText(escaped), bytes.toStdString());
+        }
+    }
+
     void bytesOfField() {
-        struct Case {
-            QByteArray shown;
-            QString pasted;
-            QByteArray bytes;
-        };
         const QByteArray longText(40000, 'x');
-        for (const Case &test :
-             std::initializer_list<Case>{{" a ", "b ", " a b "},
-                                         {"", "a\r\nb\nc", "a  b c"},
-                                         {"", QString::fromLatin1("a\0b", 3), "a b"},
-                                         {"\xff\xc3", "a", "\xff\xc3" + QByteArray{"a"}},
-                                         {longText, longText, longText + longText}}) {
+        const QString nul{QChar{0}};
+        using Case = std::tuple<QByteArray, QString, QByteArray>;
+        for (const auto &[shown, pasted, bytes] :
+             {Case{" a ", "b ", " a b "},
+              {"", "a\r\nb\nc" + nul + "d", "a  b c d"},
+              {"\xff\xc3", "a", "\xff\xc3" + QByteArray{"a"}},
+              {longText, longText, longText + longText},
+              {QByteArray(1'000'001, 'x'), "a", QByteArray(1'000'001, 'x')}}) {
             const std::unique_ptr<QLineEdit> field{newField(nullptr)};
-            showBytes(field.get(), test.shown.toStdString());
+            showBytes(field.get(), shown.toStdString());
             field->end(false);
-            paste(field.get(), test.pasted);
-            QCOMPARE(QByteArray::fromStdString(fieldBytes(field.get())), test.bytes);
+            paste(field.get(), pasted);
+            QCOMPARE(fieldBytes(field.get()), bytes.toStdString());
         }
     }
 
     void fetcherField() {
-        struct Case {
-            const char *caption;
-            QByteArray stored;
-            int position;
-            QString pasted;
-            QByteArray bytes;
-        };
         const auto x = [](int count) { return QByteArray(count, 'x'); };
         const QByteArray accented{"\xc3\xa9"};
         const QByteArray smile{"\xf0\x9f\x98\x80"};
         const char *user = "&Username:";
         const char *password = "&Password:";
-        for (const Case &test : std::initializer_list<Case>{
-                 {"&Server:", "", 0, QString(200000, 'x'), x(63)},
-                 {user, "", 0, accented.repeated(20), accented.repeated(15)},
-                 {password, "", 0, smile.repeated(20), smile.repeated(7)},
-                 {user, x(30), 10, "bbb", x(10) + "b" + x(20)},
-                 {user, x(30), 9, accented, x(30)},
-                 {user, QByteArray(31, '\xff'), 31, "b", QByteArray(31, '\xff')},
-                 {"&Server:", "x", 1, "a:b", "x"},
-                 {user, "x", 1, "a@b", "x"},
-                 {password, "x", 1, "a,b", "x"},
-                 {user, "x", 0, "*", "x"},
-                 {user, "x", 0, QString(QChar(0)), "x"},
-                 {user, "xx", 1, "-*%", "x-*%x"},
-                 {user, "%x", 2, "y", "%xy"},
-                 {password, "xx", 0, "-", "-xx"}}) {
+        using Case = std::tuple<const char *, QByteArray, int, QString, QByteArray>;
+        for (const auto &[caption, stored, position, pasted, bytes] :
+             {Case{"&Server:", "", 0, QString(200000, 'x'), x(63)},
+              {user, "", 0, accented.repeated(20), accented.repeated(15)},
+              {password, "", 0, smile.repeated(20), smile.repeated(7)},
+              {user, x(30), 10, "bbb", x(10) + "b" + x(20)},
+              {user, x(30), 9, accented, x(30)},
+              {user, QByteArray(31, '\xff'), 31, "b", QByteArray(31, '\xff')},
+              {"&Server:", "x", 1, "a:b", "x"},
+              {user, "x", 1, "a@b", "x"},
+              {password, "x", 1, "a,b", "x"},
+              {user, "x", 0, "*", "x"},
+              {user, "x", 0, QString(QChar(0)), "x"},
+              {user, "xx", 1, "-*%", "x-*%x"},
+              {user, "%x", 2, "y", "%xy"},
+              {password, "xx", 0, "-", "-xx"}}) {
             pop_host host;
-            setPopHostText(host.server, test.stored.toStdString());
-            setPopHostText(host.user, test.stored.toStdString());
-            setPopHostText(host.password, test.stored.toStdString());
+            for (auto *array : {&host.user, &host.password}) {
+                setPopHostText(*array, stored.toStdString());
+            }
+            setPopHostText(host.server, stored.toStdString());
             const EditFetch dialog{nullptr, "edit", &host};
-            QLineEdit *field = fieldBeside(&dialog, test.caption);
-            field->setCursorPosition(test.position);
-            paste(field, test.pasted);
-            QCOMPARE(QByteArray::fromStdString(fieldBytes(field)), test.bytes);
+            QLineEdit *field = fieldBeside(&dialog, caption);
+            field->setCursorPosition(position);
+            paste(field, pasted);
+            QCOMPARE(fieldBytes(field), bytes.toStdString());
         }
     }
 
@@ -79,6 +110,43 @@ private slots:
             QCOMPARE(field->text(), "!new@#");
         }
     }
+
+    void storedNumberIsKept() {
+        for (const int stored : {3600, 999, -1, 0, 7000, std::numeric_limits<int>::min(), 5}) {
+            number_.setValue(stored);
+            number_.setFocus();
+            QTest::keyClick(&number_, Qt::Key_Return);
+            number_.clearFocus();
+            QCOMPARE(number_.text(), QString::number(stored));
+            QCOMPARE(number_.getValue(), stored);
+            QCOMPARE(number_.toolTip().isEmpty(), stored >= 0 && stored <= 999);
+        }
+    }
+
+    void userEndsInRange() {
+        using Case = std::tuple<int, Qt::Key, const char *, int>;
+        for (const auto &[stored, key, pasted, expected] : {Case{999, Qt::Key_Up, "", 999},
+                                                            {3600, Qt::Key_Down, "", 999},
+                                                            {-5, Qt::Key_Up, "", 0},
+                                                            {3600, Qt::Key_Backspace, "", 360},
+                                                            {3600, Qt::Key_Delete, "42", 42},
+                                                            {3600, Qt::Key_Delete, "1500", 999},
+                                                            {-500, Qt::Key_Delete, "-20", 0}}) {
+            number_.setValue(stored);
+            QTest::keyClick(&number_, Qt::Key_End);
+            QTest::keyClick(&number_, key);
+            if (*pasted != '\0') {
+                number_.selectAll();
+                paste(&number_, pasted);
+            }
+            QCOMPARE(number_.getValue(), expected);
+            type(&number_, "1000");
+            QCOMPARE(number_.getValue(), 100);
+        }
+    }
+
+private:
+    KNumericSpinBox number_;
 };
 
 QTEST_MAIN(TestFields)

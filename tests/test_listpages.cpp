@@ -278,15 +278,14 @@ private slots:
             auto *button = captioned(dialog, &QWidget::accessibleName, caption + " Browse...");
             field->setText(folder.path());
             for (const bool isAccepted : {false, true}) {
-                const auto choose = [&](QWidget *window) {
-                    auto *chooser = qobject_cast<QFileDialog *>(window);
+                const auto choose = [&](QFileDialog *chooser) {
                     QCOMPARE(chooser->objectName(), name);
                     QVERIFY(chooser->directory().path().startsWith(folder.path()));
                     chooser->selectFile(folder.filePath(chosen));
                     static_cast<QDialog *>(chooser)->done(isAccepted ? 1 : 0);
                 };
-                QVERIFY(
-                    withDialog([&] { qobject_cast<QAbstractButton *>(button)->click(); }, choose));
+                QVERIFY(withDialog<QFileDialog>(
+                    [&] { qobject_cast<QAbstractButton *>(button)->click(); }, choose));
                 QCOMPARE(field->text(), isAccepted ? folder.filePath(chosen) : folder.path());
             }
         }
@@ -306,19 +305,14 @@ private slots:
 
     void fileThatCannotBeRead() {
         withEditor("ann\n", [](QWidget *editor) {
-            // The message comes when the dialog has gone: it is waited for beside it.
-            QString message;
-            QTimer confirm;
-            connect(&confirm, &QTimer::timeout, [&] {
-                if (auto *box = qobject_cast<QMessageBox *>(QApplication::activeModalWidget())) {
-                    message = box->windowTitle() + "|" + box->text();
-                    box->accept();
-                }
-            });
-            confirm.start(0);
-            act(editor, "Load File", "&Filename:", "/no/such/file");
-            QCOMPARE(message, "Mailling List Manager|Could not open file for reading - "
-                              "perhaps permission denied?.\n\n");
+            const auto confirm = [](QMessageBox *message) {
+                QCOMPARE(message->windowTitle(), "Mailling List Manager");
+                QCOMPARE(message->text(), "Could not open file for reading - perhaps permission "
+                                          "denied?.\n\n");
+                message->accept();
+            };
+            QVERIFY(withDialog<QMessageBox>(
+                [&] { act(editor, "Load File", "&Filename:", "/no/such/file"); }, confirm));
             QCOMPARE(rowsOf(boxIn(editor)), "ann");
         });
     }

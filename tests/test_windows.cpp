@@ -229,11 +229,6 @@ private slots:
             QVERIFY(window->findChild<QScrollArea *>() != nullptr);
         }
         QCOMPARE(dialog.findChild<QTabWidget *>()->tabText(1), "&IMAP");
-        setFont(10);
-        KControlDialog small;
-        small.addPage(new MailSMTP(&small, "smtpserver"), "&SMTP", {});
-        small.addButtons();
-        QVERIFY(small.findChild<QScrollArea *>() == nullptr);
     }
 
     void refusalCoversNoField() {

@@ -8,6 +8,7 @@
 #include "server/smtprejectfile.h"
 
 #include <QProcess>
+#include <QScrollArea>
 #include <QSpinBox>
 #include <QTabWidget>
 #include <QTextBrowser>
@@ -113,7 +114,7 @@ private slots:
                                    "&Mail List=list");
         QVERIFY(QTest::qWaitForWindowActive(mainDialog()));
         QCOMPARE(mainDialog()->windowTitle(), "Tarvex Mail Config");
-        QVERIFY(!fs::exists(runs));
+        QVERIFY(!fs::exists(runs) && anywhere<QScrollArea>() == nullptr);
     }
 
     void applyWithoutEditsKeepsEveryValue() {
