@@ -33,7 +33,7 @@ inline std::string decoded(std::string text) {
 /// Checks what `convert` makes of the bytes in a section of the list of formats.
 template <class Convert>
 void checkRows(Convert convert, const char *section) {
-    std::ifstream list{QFINDTESTDATA("formats.txt").toStdString()};
+    std::ifstream list{TEST_DATA "/formats.txt"};
     std::string line;
     while (line != section) {
         QVERIFY2(std::getline(list, line), section);

@@ -1,6 +1,7 @@
 #include "alias/aliasfile.h"
 #include "alias/editaliasentry.h"
 #include "alias/mailalias.h"
+#include "base/textfile.h"
 #include "config/settings.h"
 #include "fetch/mailfetch.h"
 #include "fetch/pophosts.h"
@@ -95,19 +96,10 @@ void editRows(const char *caption) {
     }
 }
 
-constexpr std::array<const char *, 9> textLines{
-    "%name:&Mail list Name:",     "%post:&Posting Address:",    "%admin:&Subscribe Address:",
-    "%support:&Support Address:", "%info:&Info file:",          "%footer:&Footer file:",
-    "%header:&Header file:",      "%modrt:&Moderator Address:", "%info:&Info file:"};
-
 /// A list in its file. Its texts are the captions of their fields, behind a prefix.
 std::string block(const QByteArray &prefix, const QByteArray &numbers, const QByteArray &members) {
-    QByteArray text = "#new\n";
-    for (const QByteArray line : textLines) {
-        text += QByteArray{line}.replace('&', prefix + '&') + '\n';
-    }
-    text += numbers + "%digcnt:7\n%digcur:8\n%flags:71\n#start member\n" + members +
-            "#end\n#start allow\n:al\n#end\n#start block\nbl\n#end\n#endlist\n\n\n";
+    QByteArray text = QByteArray::fromStdString(readWholeFile(TEST_DATA "/list.txt").value_or(""));
+    text.replace("&", prefix + '&').replace("@numbers\n", numbers).replace("@members\n", members);
     return text.toStdString();
 }
 
@@ -185,9 +177,10 @@ private slots:
         withEditor(":ann\n", [](QWidget *) {});
         QCOMPARE(formatMailLists(maillist_list), unchanged);
         withEditor(":ann\n", [&](QWidget *editor) {
-            for (const QString line : textLines) {
-                const QString caption = line.mid(line.indexOf('&'));
-                type(fieldBeside(editor, caption), "new " + caption);
+            for (const QLabel *label : editor->findChildren<QLabel *>()) {
+                if (label->text().contains('&')) {
+                    type(label->buddy(), "new " + label->text());
+                }
             }
             type(fieldBeside<QWidget>(editor, "Digest size trigger:"), "1024");
             type(fieldBeside<QWidget>(editor, "Digest count trigger:"), "1025");

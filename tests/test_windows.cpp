@@ -76,11 +76,8 @@ QString described(const QWidget *part) {
 
 /// From left to right, and from top to bottom.
 QString measured(QRect place) {
-    return QString("%1-%2 %3-%4")
-        .arg(place.left())
-        .arg(place.right() + 1)
-        .arg(place.top())
-        .arg(place.bottom() + 1);
+    return QString::asprintf("%d-%d %d-%d", place.left(), place.right() + 1, place.top(),
+                             place.bottom() + 1);
 }
 
 /// Where a part of a dialog of fixed size is, or how wide one of fixed width; then what it tells.
@@ -173,7 +170,7 @@ private slots:
     /// small font all given measures hold.
     void windowsAreAsListed() {
         setFont(7);
-        QFile list{QFINDTESTDATA("windows.txt")};
+        QFile list{TEST_DATA "/windows.txt"};
         QVERIFY(list.open(QIODevice::ReadOnly));
         QStringList lines;
         for (const auto make : makers) {
