@@ -7,6 +7,8 @@
 #include "datafiles.h"
 #include "dialogdriver.h"
 
+#include <QWheelEvent>
+
 #include <limits>
 
 namespace {
@@ -91,6 +93,8 @@ private slots:
             number_.setFocus();
             QTest::keyClick(&number_, Qt::Key_Return);
             number_.clearFocus();
+            QWheelEvent wheel{{}, {}, {}, {0, 120}, {}, {}, Qt::NoScrollPhase, false};
+            QApplication::sendEvent(&number_, &wheel);
             QCOMPARE(number_.text(), QString::number(stored));
             QCOMPARE(number_.getValue(), stored);
             QCOMPARE(number_.toolTip().isEmpty(), stored >= 0 && stored <= 999);

@@ -6,14 +6,9 @@
 #include "lists/maillistfile.h"
 #include "server/smtprejectfile.h"
 
-#include <cstdlib>
-
 using namespace std::string_literals;
 
 namespace {
-
-/// How many allocations of this thread succeed until one fails; negative for any number.
-thread_local int allocationsLeft = -1;
 
 /// "<address|0target|2+target>": each target's type, "+" where it has the mark, its text.
 std::string shownAliases(const RecordChain<alias_entry> &list) {
@@ -89,17 +84,6 @@ void checkRandomLists(unsigned most, Make make, Rewrite rewrite) {
 }
 
 } // namespace
-
-void *operator new(std::size_t size) {
-    if (allocationsLeft-- == 0) {
-        throw std::bad_alloc{};
-    }
-    return std::malloc(size);
-}
-
-void operator delete(void *memory) noexcept { std::free(memory); }
-
-void operator delete(void *memory, std::size_t) noexcept { std::free(memory); }
 
 /// The formats that hold lists of records.
 class TestListFiles : public QObject {
@@ -230,21 +214,6 @@ private slots:
     void aMillionRecordsAreFreedWithoutRecursion() {
         rewrittenRejects(QByteArray{"a\n"}.repeated(1'000'000).toStdString());
         smtpreject_list.clear();
-    }
-
-    void outOfMemoryKeepsWhatWasRead() {
-        settings().mail_file_alias.value = newPath();
-        rewriteFile(*settings().mail_file_alias.value, "a,b\nc,#d\n");
-        std::string states = " ";
-        for (int allocations = 0, result = 2; result != 0; ++allocations) {
-            alias_list.clear();
-            allocationsLeft = allocations;
-            result = readAliasFile();
-            allocationsLeft = -1;
-            const std::string state = std::to_string(result) + shownAliases(alias_list) + ' ';
-            states += states.ends_with(' ' + state) ? "" : state;
-        }
-        QCOMPARE(states.c_str(), " 2 2<a> 2<a|0b> 2<a|0b><c> 0<a|0b><c|2d> ");
     }
 };
 

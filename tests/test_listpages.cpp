@@ -1,17 +1,11 @@
 #include "alias/aliasfile.h"
-#include "alias/editaliasentry.h"
-#include "alias/mailalias.h"
 #include "base/textfile.h"
 #include "config/settings.h"
-#include "fetch/mailfetch.h"
 #include "fetch/pophosts.h"
-#include "lists/editlist.h"
-#include "lists/listload.h"
-#include "lists/maillist.h"
-#include "server/mailsmtp.h"
 #include "server/smtprejectfile.h"
 
 #include "dialogdriver.h"
+#include "windows.h"
 
 #include <QComboBox>
 #include <QFileDialog>

@@ -1,10 +1,7 @@
 #include "config/settings.h"
-#include "server/maildebatch.h"
-#include "server/mailimap.h"
-#include "server/mailpop3.h"
-#include "server/mailsmtp.h"
 
 #include "dialogdriver.h"
+#include "windows.h"
 
 #include <map>
 #include <memory>
