@@ -21,7 +21,7 @@ std::string pasted(const std::string &row, NewField newField) {
     QLineEdit *field = newField(bytesFromText(parts.at(0) + parts.at(2)));
     field->setCursorPosition(static_cast<int>(parts.at(0).size()));
     paste(field, parts.at(1));
-    return fieldBytes(field);
+    return (field->isReadOnly() ? "read-only: " : "") + fieldBytes(field);
 }
 
 } // namespace

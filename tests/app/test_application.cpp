@@ -227,7 +227,9 @@ private slots:
                                   +[] { press(mainDialog(), "OK"); }}) {
             QVERIFY(!fs::exists(runs));
             mainDialog()->show();
-            close();
+            help()->window()->show(); // Left open, it does not keep the program alive.
+            QTimer::singleShot(0, close);
+            QCoreApplication::exec();
             QVERIFY(!mainDialog()->isVisible());
         }
         QVERIFY(fs::exists(runs));
