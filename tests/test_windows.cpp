@@ -215,6 +215,7 @@ private slots:
             QVERIFY(window->height() <= window->screen()->availableGeometry().height());
             const QWidget *ok = captioned(window, &QAbstractButton::text, "OK");
             QVERIFY(window->rect().contains(placeOf(ok)));
+            window->resize(1500, window->height());
             QVERIFY(window->findChild<QScrollArea *>() != nullptr);
             for (const auto *area : window->findChildren<QScrollArea *>()) {
                 QVERIFY(!area->isVisible() || area->widget()->width() >= area->viewport()->width());

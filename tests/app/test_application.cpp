@@ -40,6 +40,7 @@ std::string given(const fs::path &name) {
 /// A product tree in which every file has something that an apply changes in form.
 void layProduct() {
     fs::remove_all(product);
+    fs::create_directories(product);
     const fs::path source = fs::path{TEST_DATA "/app/product"};
     fs::copy(source, product, fs::copy_options::recursive);
     for (const auto &entry : fs::recursive_directory_iterator{source}) {
