@@ -48,6 +48,26 @@ void checkRows(Convert convert, const char *section) {
     QVERIFY2(line.empty(), line.c_str());
 }
 
+inline bool operator==(const KeptText &text, std::string_view other) {
+    return std::string_view{text} == other;
+}
+
+inline std::string operator+(std::string before, const KeptText &text) {
+    return before.append(std::string_view{text});
+}
+
+/// The bytes of a file; "none" where it cannot be read.
+inline std::string bytesAt(const std::string &path) {
+    const std::optional<FileBytes> file = readWholeFile(path);
+    return file ? std::string{std::string_view{*file}} : "none";
+}
+
+/// What a format puts of a list.
+template <class List>
+std::string whole(void (*format)(const List &, ByteSink &), const List &list) {
+    return formatted([&](ByteSink &sink) { format(list, sink); });
+}
+
 /// A path in the test's own product at which no file is yet.
 inline std::string newPath() {
     std::filesystem::remove_all(TEST_PRODUCT);

@@ -18,10 +18,14 @@ namespace {
 template <class NewField>
 std::string pasted(const std::string &row, NewField newField) {
     const QStringList parts = textFromBytes(row).replace('>', '<').split('<');
-    QLineEdit *field = newField(bytesFromText(parts.at(0) + parts.at(2)));
+    const KeptText stored = keep(bytesFromText(parts.at(0) + parts.at(2)));
+    QLineEdit *field = newField(stored);
+    if (fieldText(field, stored).data() != stored.data()) {
+        return "not the stored text again";
+    }
     field->setCursorPosition(static_cast<int>(parts.at(0).size()));
     paste(field, parts.at(1));
-    return (field->isReadOnly() ? "read-only: " : "") + fieldBytes(field);
+    return (field->isReadOnly() ? "read-only: " : "") + fieldText(field, stored);
 }
 
 } // namespace
@@ -56,7 +60,7 @@ private slots:
         checkRows(
             [](const std::string &row) {
                 const std::unique_ptr<QLineEdit> field{newField(nullptr)};
-                return pasted(row, [&](const std::string &stored) {
+                return pasted(row, [&](KeptText stored) {
                     showBytes(field.get(), stored);
                     return field.get();
                 });
@@ -64,7 +68,7 @@ private slots:
             "[pasting into a field]");
         for (const char *caption : {"&Server:", "&Username:", "&Password:"}) {
             std::optional<EditFetch> dialog;
-            const auto inDialog = [&](const std::string &stored) {
+            const auto inDialog = [&](KeptText stored) {
                 pop_host host;
                 setPopHostText(host.server, stored);
                 setPopHostText(host.user, stored);

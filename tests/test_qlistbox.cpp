@@ -12,9 +12,10 @@ namespace {
 
 /// A list in a dialog with a default button.
 struct Window {
-    explicit Window(int current, std::vector<std::string> rows = {"a", "b", "c", "d", "e"}) {
+    explicit Window(int current,
+                    const std::vector<std::string_view> &rows = {"a", "b", "c", "d", "e"}) {
         box->resize(200, 300);
-        box->append(std::move(rows));
+        box->append(rows);
         ok->setDefault(true);
         QObject::connect(ok, &QPushButton::clicked, &dialog, &QDialog::accept);
         QObject::connect(box, &QListBox::selected,
@@ -71,7 +72,8 @@ private slots:
     }
 
     void focusIsSeen() {
-        for (const std::vector<std::string> &rows : {std::vector<std::string>{}, {"a", "b"}}) {
+        for (const std::vector<std::string_view> &rows :
+             {std::vector<std::string_view>{}, {"a", "b"}}) {
             Window window{-1, rows};
             QVERIFY(QTest::qWaitForWindowActive(&window.dialog));
             window.ok->setFocus();
@@ -82,8 +84,8 @@ private slots:
     }
 
     void addedRowIsSeenButNotChosen() {
-        Window window{0, std::vector<std::string>(100, "x")};
-        window.box->append(std::string{"new"});
+        Window window{0, std::vector<std::string_view>(100, "x")};
+        window.box->append("new");
         QVERIFY(window.box->viewport()->rect().contains(centreOfRow(window.box, 100)));
         QCOMPARE(window.current(), "0");
     }

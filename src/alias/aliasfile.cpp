@@ -2,18 +2,17 @@
 
 #include "config/datafile.h"
 
-#include <algorithm>
 #include <cctype>
 
 RecordChain<alias_entry> alias_list;
 
 namespace {
 
-constexpr std::string_view skippedBeginnings{"|# \r\n\t"};
-constexpr std::string_view wordEnds{"\t ,"};
+constexpr ByteSet skippedBeginnings{"|# \r\n\t"};
+constexpr ByteSet wordEnds{"\t ,"};
 
-bool separatesTargets(char character) {
-    return character == ',' || std::isspace(static_cast<unsigned char>(character)) != 0;
+bool separatesTargets(unsigned char character) {
+    return character == ',' || std::isspace(character) != 0;
 }
 
 std::uint8_t typeByContent(std::string_view word) {
@@ -27,30 +26,28 @@ std::uint8_t typeByContent(std::string_view word) {
 }
 
 /// Takes the target that `rest` begins with.
-alias_list_entry takeTarget(std::string_view &rest) {
+alias_list_entry takeTarget(KeptText &rest) {
     alias_list_entry target;
     if (rest.starts_with('!')) {
         target.bang = 1;
         rest.remove_prefix(1);
     }
-    std::string_view word = rest.substr(0, rest.find_first_of(wordEnds));
-    rest.remove_prefix(word.size());
-    if (word.starts_with('#')) {
+    target.alias = rest.substr(0, wordEnds.lengthBefore(rest));
+    rest.remove_prefix(target.alias.size());
+    if (target.alias.starts_with('#')) {
         target.type = ALIAS_LIST_ADMIN;
-        word.remove_prefix(1);
+        target.alias.remove_prefix(1);
     } else {
-        target.type = typeByContent(word);
+        target.type = typeByContent(target.alias);
     }
-    target.alias = word;
     return target;
 }
 
 /// `rest` is what follows an alias's address on its line.
-void takeTargets(std::string_view rest, alias_entry &alias) {
+void takeTargets(KeptText rest, const ByteSet &separators, alias_entry &alias) {
     RecordAppender<alias_list_entry> end{&alias.aliases.head};
     for (;;) {
-        const auto *const target = std::ranges::find_if_not(rest, separatesTargets);
-        rest.remove_prefix(static_cast<std::size_t>(target - rest.begin()));
+        rest.remove_prefix(separators.lengthOf(rest));
         if (rest.empty()) {
             return;
         }
@@ -58,44 +55,41 @@ void takeTargets(std::string_view rest, alias_entry &alias) {
     }
 }
 
-void appendAlias(std::string &bytes, const alias_entry &alias) {
-    bytes += alias.address;
+void putAlias(ByteSink &sink, const alias_entry &alias) {
+    sink.put(alias.address);
     for (const alias_list_entry &target : alias.aliases) {
-        bytes += ',';
-        bytes += target.bang != 0 ? "!" : "";
-        bytes += target.type == ALIAS_LIST_ADMIN && !target.alias.starts_with('#') ? "#" : "";
-        bytes += target.alias;
+        const bool hasAdminMark = target.type == ALIAS_LIST_ADMIN && !target.alias.starts_with('#');
+        sink.put(target.bang == 0 ? (hasAdminMark ? ",#" : ",") : (hasAdminMark ? ",!#" : ",!"));
+        sink.put(target.alias);
     }
-    bytes += '\n';
+    sink.put('\n');
 }
 
 } // namespace
 
-void parseAliases(std::string_view bytes, RecordChain<alias_entry> &list) {
+void parseAliases(KeptText bytes, RecordChain<alias_entry> &list) {
+    const ByteSet separators = ByteSet::of(separatesTargets);
     RecordAppender<alias_entry> end{&list.head};
     LinePieces lines{bytes};
-    while (const std::optional<std::string_view> line = lines.next()) {
-        const std::string_view text = lineText(*line);
-        const std::size_t addressEnd = text.find_first_of(wordEnds);
-        if (skippedBeginnings.find(line->front()) == std::string_view::npos &&
-            addressEnd != std::string_view::npos) {
-            alias_entry &alias = end.append({std::string{text.substr(0, addressEnd)}, {}});
-            takeTargets(text.substr(addressEnd), alias);
+    while (const std::optional<KeptText> line = lines.next()) {
+        const KeptText text = lineText(*line);
+        const std::size_t addressEnd = wordEnds.lengthBefore(text);
+        if (!skippedBeginnings.holds(line->front()) && addressEnd < text.size()) {
+            alias_entry &alias = end.append({text.substr(0, addressEnd), {}});
+            takeTargets(text.substr(addressEnd), separators, alias);
         }
     }
 }
 
-std::string formatAliases(const RecordChain<alias_entry> &list) {
-    std::string bytes;
+void formatAliases(const RecordChain<alias_entry> &list, ByteSink &sink) {
     for (const alias_entry &alias : list) {
-        appendAlias(bytes, alias);
+        putAlias(sink, alias);
     }
-    return bytes;
 }
 
 int readAliasFile() {
     try {
-        const std::optional<std::string> bytes = readDataFile(settings().mail_file_alias);
+        const std::optional<KeptText> bytes = readDataFile(settings().mail_file_alias);
         if (!bytes) {
             return 1;
         }
@@ -107,5 +101,6 @@ int readAliasFile() {
 }
 
 void writeAliasFile() {
-    rewriteDataFile(settings().mail_file_alias, [] { return formatAliases(alias_list); });
+    rewriteDataFile(settings().mail_file_alias,
+                    [](ByteSink &sink) { formatAliases(alias_list, sink); });
 }

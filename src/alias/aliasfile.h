@@ -1,10 +1,10 @@
 #pragma once
 
+#include "base/bytesink.h"
+#include "base/kepttext.h"
 #include "base/recordlist.h"
 
 #include <cstdint>
-#include <string>
-#include <string_view>
 
 /// The alias file, one alias a line: the address, then its targets behind commas or white space:
 ///
@@ -22,14 +22,14 @@ enum AliasType : std::uint8_t {
 };
 
 struct alias_list_entry {
-    std::string alias;
+    KeptText alias;
     std::uint8_t type = ALIAS_PLAIN;
     std::uint8_t bang = 0; ///< 1 when "!" stands before the target; it is not part of the text.
     alias_list_entry *next = nullptr;
 };
 
 struct alias_entry {
-    std::string address;
+    KeptText address;
     RecordChain<alias_list_entry> aliases;
     alias_entry *next = nullptr;
 };
@@ -39,8 +39,8 @@ extern RecordChain<alias_entry> alias_list;
 
 /// Puts the aliases of the file's bytes at the end of `list`. Throws std::bad_alloc with what was
 /// read until then in the list.
-void parseAliases(std::string_view bytes, RecordChain<alias_entry> &list);
-std::string formatAliases(const RecordChain<alias_entry> &list);
+void parseAliases(KeptText bytes, RecordChain<alias_entry> &list);
+void formatAliases(const RecordChain<alias_entry> &list, ByteSink &sink);
 
 /// Adds the file's aliases to alias_list. 0 when the file was read to its end, 1 when it cannot be
 /// opened, 2 when memory ran out; what was read until then stays.

@@ -21,7 +21,7 @@ alias_list_entry copyOf(const alias_list_entry &target) {
 EditAlias::EditAlias(QWidget *parent, const char *name, const alias_entry *alias)
     : FormDialog(parent, name, "Email Address Aliasing") {
     address_ = addField(translatable("&Address:"), {70, 18},
-                        alias != nullptr ? std::string_view{alias->address} : "");
+                        alias != nullptr ? alias->address : KeptText{});
     applyRule(address_, oneWordRule());
 
     auto *group = new ListGroup("Aliases", {250, 70}, this);
@@ -38,7 +38,7 @@ EditAlias::EditAlias(QWidget *parent, const char *name, const alias_entry *alias
     fixSize({350, 210}, {348, 180});
 }
 
-std::string EditAlias::address() const { return fieldBytes(address_); }
+KeptText EditAlias::address(KeptText before) const { return fieldText(address_, before); }
 
 RecordChain<alias_list_entry> EditAlias::takeTargets() { return std::move(targets_); }
 

@@ -15,7 +15,8 @@ public:
     /// `alias` is what the dialog starts with; null for an empty one.
     EditAlias(QWidget *parent, const char *name, const alias_entry *alias);
 
-    [[nodiscard]] std::string address() const;
+    /// As a record takes it that holds `before`.
+    [[nodiscard]] KeptText address(KeptText before) const;
     /// Gives the working list away; the dialog's is empty afterwards.
     [[nodiscard]] RecordChain<alias_list_entry> takeTargets();
 

@@ -43,7 +43,7 @@ EditAliasEntry::EditAliasEntry(QWidget *parent, const char *name, const alias_li
     QHBoxLayout *aliasRow = addRow();
     CaptionColumn aliasCaption{{40, 18}};
     alias_ = addField(aliasRow, translatable("&Alias:"), aliasCaption,
-                      target != nullptr ? std::string_view{target->alias} : "");
+                      target != nullptr ? target->alias : KeptText{});
     applyRule(alias_, oneWordRule());
     connect(addBrowseButton(aliasRow, 70, translatable("&Alias:")), &QPushButton::clicked, this,
             &EditAliasEntry::browse);
@@ -66,7 +66,7 @@ EditAliasEntry::EditAliasEntry(QWidget *parent, const char *name, const alias_li
 }
 
 void EditAliasEntry::store(alias_list_entry &target) const {
-    target.alias = fieldBytes(alias_);
+    target.alias = fieldText(alias_, target.alias);
     const auto &entry = typeEntries.at(static_cast<std::size_t>(type_->currentIndex()));
     target.type = entry.type.value_or(target.type);
 }

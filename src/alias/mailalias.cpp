@@ -41,7 +41,7 @@ void MailAlias::MailAliasModify() { MailAliasSelected(currentText(aliases_)); }
 
 void MailAlias::MailAliasRead(alias_entry *alias, EditAlias *dialog) {
     if (alias != nullptr && dialog != nullptr) {
-        alias->address = dialog->address();
+        alias->address = dialog->address(alias->address);
         alias->aliases = dialog->takeTargets();
     }
 }

@@ -3,8 +3,9 @@
 #include <cerrno>
 #include <csignal>
 #include <fcntl.h>
-#include <new>
+#include <sys/resource.h>
 #include <sys/stat.h>
+#include <sys/statvfs.h>
 #include <unistd.h>
 
 namespace {
@@ -60,23 +61,83 @@ private:
     void (*pipe_)(int);
 };
 
+/// Measures what a format puts.
+class CountingSink : public ByteSink {
+public:
+    [[nodiscard]] std::size_t count() const { return count_; }
+
+protected:
+    void take(std::string_view bytes) override { count_ += bytes.size(); }
+
+private:
+    std::size_t count_ = 0;
+};
+
+class FileSink : public ByteSink {
+public:
+    explicit FileSink(int file) : file_{file} {}
+    [[nodiscard]] bool isWhole() const { return isWhole_; }
+    [[nodiscard]] std::size_t written() const { return written_; }
+
+protected:
+    void take(std::string_view bytes) override {
+        while (isWhole_ && !bytes.empty()) {
+            const ssize_t count = ::write(file_, bytes.data(), bytes.size());
+            if (count > 0) {
+                bytes.remove_prefix(static_cast<std::size_t>(count));
+                written_ += static_cast<std::size_t>(count);
+            } else {
+                isWhole_ = count < 0 && errno == EINTR;
+            }
+        }
+    }
+
+private:
+    int file_;
+    bool isWhole_ = true;
+    std::size_t written_ = 0;
+};
+
+/// Whether the file system says that it has room for `size` bytes more; some say nothing.
+bool hasFreeSpace(int file, std::size_t size) {
+    struct statvfs system {};
+    return ::fstatvfs(file, &system) != 0 || system.f_blocks == 0 ||
+           system.f_bavail * system.f_frsize >= size;
+}
+
+/// Has room for `size` bytes set aside for the file; where the file system cannot do that, asks
+/// whether there is as much. False when there is none: what was had of it by then is given back.
+bool takeRoom(int file, const struct stat &status, std::size_t size) {
+    rlimit limit{};
+    if (::getrlimit(RLIMIT_FSIZE, &limit) == 0 && limit.rlim_cur < size) {
+        return false;
+    }
+    if (size == 0 || ::fallocate(file, FALLOC_FL_KEEP_SIZE, 0, static_cast<off_t>(size)) == 0) {
+        return true;
+    }
+    if (errno != ENOSPC && errno != EDQUOT && errno != EFBIG) {
+        const std::size_t had = static_cast<std::size_t>(status.st_blocks) * 512;
+        return size <= had || hasFreeSpace(file, size - had);
+    }
+    [[maybe_unused]] const int result = ::ftruncate(file, status.st_size);
+    return false;
+}
+
 } // namespace
 
-std::optional<std::string> readWholeFile(const std::string &path) {
+std::optional<FileBytes> readWholeFile(const std::string &path) {
     const FileDescriptor file{path, O_RDONLY};
     struct stat status {};
     if (!file.isOpen() || ::fstat(file.number(), &status) != 0 || !S_ISREG(status.st_mode)) {
         return std::nullopt;
     }
-    if (static_cast<std::size_t>(status.st_size) >= std::string{}.max_size()) {
-        throw std::bad_alloc{}; // The string would throw something else.
-    }
     // One byte more than the size, so that the end is found without growing; a file that says
     // nothing of its size, or grows meanwhile, is read to its end all the same.
-    std::string bytes(static_cast<std::size_t>(status.st_size) + 1, '\0');
-    std::size_t length = 0;
+    std::size_t size = static_cast<std::size_t>(status.st_size) + 1;
+    FileBytes read{std::unique_ptr<char[]>{new char[size]}};
     for (;;) {
-        const ssize_t count = ::read(file.number(), bytes.data() + length, bytes.size() - length);
+        const ssize_t count =
+            ::read(file.number(), read.bytes.get() + read.length, size - read.length);
         if (count < 0 && errno == EINTR) {
             continue;
         }
@@ -84,33 +145,42 @@ std::optional<std::string> readWholeFile(const std::string &path) {
             return std::nullopt;
         }
         if (count == 0) {
-            bytes.resize(length);
-            return bytes;
+            return read;
         }
-        length += static_cast<std::size_t>(count);
-        if (length == bytes.size()) {
-            bytes.resize(2 * length + 4096);
+        read.length += static_cast<std::size_t>(count);
+        if (read.length == size) {
+            size = 2 * size + 4096;
+            std::unique_ptr<char[]> larger{new char[size]};
+            std::memcpy(larger.get(), read.bytes.get(), read.length);
+            read.bytes = std::move(larger);
         }
     }
 }
 
-bool rewriteFile(const std::string &path, std::string_view bytes) {
-    const FileDescriptor file{path, O_WRONLY | O_CREAT | O_TRUNC};
-    if (!file.isOpen()) {
+bool rewriteFile(const std::string &path, const std::function<void(ByteSink &)> &format) {
+    CountingSink measure;
+    format(measure);
+    measure.flush();
+    const FileDescriptor file{path, O_WRONLY | O_CREAT};
+    struct stat status {};
+    if (!file.isOpen() || ::fstat(file.number(), &status) != 0) {
+        return false;
+    }
+    FileSink sink{file.number()};
+    const bool isRegular = S_ISREG(status.st_mode);
+    if (isRegular && !takeRoom(file.number(), status, measure.count())) {
         return false;
     }
     const WriteSignalsIgnored ignored;
-    while (!bytes.empty()) {
-        const ssize_t count = ::write(file.number(), bytes.data(), bytes.size());
-        if (count < 0 && errno == EINTR) {
-            continue;
-        }
-        if (count <= 0) {
-            return false;
-        }
-        bytes.remove_prefix(static_cast<std::size_t>(count));
-    }
-    return true;
+    format(sink);
+    sink.flush();
+    // Only now, and only behind what was written: to cut it first would give the room away again.
+    const auto end = static_cast<off_t>(sink.written());
+    return (!isRegular || ::ftruncate(file.number(), end) == 0) && sink.isWhole();
+}
+
+bool rewriteFile(const std::string &path, std::string_view bytes) {
+    return rewriteFile(path, [bytes](ByteSink &sink) { sink.put(bytes); });
 }
 
 bool mayRewrite(const std::string &path) {
@@ -123,24 +193,4 @@ bool mayRewrite(const std::string &path) {
     const std::size_t folderEnd = path.rfind('/');
     return errno == ENOENT && folderEnd != std::string::npos &&
            isAllowed(path.substr(0, folderEnd + 1), W_OK | X_OK);
-}
-
-std::optional<std::string_view> LinePieces::next() {
-    if (rest_.empty()) {
-        return std::nullopt;
-    }
-    // The search stays within the piece: short pieces of one endless line are cut in linear time.
-    const std::string_view reach = rest_.substr(0, longest_);
-    const std::size_t lineFeed = reach.find('\n');
-    const std::string_view piece =
-        lineFeed == std::string_view::npos ? reach : reach.substr(0, lineFeed + 1);
-    rest_.remove_prefix(piece.size());
-    return piece;
-}
-
-std::string_view beforeNul(std::string_view piece) { return piece.substr(0, piece.find('\0')); }
-
-std::string_view lineText(std::string_view piece) {
-    using namespace std::string_view_literals;
-    return piece.substr(0, piece.find_first_of("\r\n\0"sv));
 }

@@ -4,7 +4,6 @@
 #include "config/productpaths.h"
 #include "config/settings.h"
 
-#include <algorithm>
 #include <cstdio>
 #include <new>
 
@@ -12,9 +11,10 @@ namespace {
 
 constexpr char commentMark = '|';
 constexpr char keyMark = '%';
+constexpr ByteSet blanks{" \t"};
 
 std::string_view withoutLeadingBlanks(std::string_view text) {
-    return text.substr(std::min(text.find_first_not_of(" \t"), text.size()));
+    return text.substr(blanks.lengthOf(text));
 }
 
 /// Collects one setting's lines; hands them over when the next setting begins.
@@ -45,31 +45,26 @@ private:
     std::string value_;
 };
 
-void appendValue(std::string &output, std::string_view value) {
-    for (const char character : value) {
-        if (character == ',') {
-            output += "\n\t";
-        } else {
-            output += character;
+/// A template's key line with the store's value, or as it is.
+MasterLine keyLine(std::string_view line) {
+    const std::size_t colon = line.find(':');
+    if (colon != std::string_view::npos) {
+        if (auto value = settingByKey(std::string{line.substr(1, colon - 1)}, std::nullopt)) {
+            return {line.substr(0, colon), std::move(value)};
         }
     }
+    return {line, std::nullopt};
 }
 
-/// A template's key line with the store's value, or the line itself.
-void appendKeyLine(std::string &output, std::string_view line) {
-    const std::size_t colon = line.find(':');
-    std::optional<std::string> value;
-    if (colon != std::string_view::npos) {
-        value = settingByKey(std::string{line.substr(1, colon - 1)}, std::nullopt);
+void putValue(ByteSink &sink, std::string_view value) {
+    sink.put(": ");
+    for (std::size_t comma = 0; (comma = value.find(',')) != std::string_view::npos;) {
+        sink.put(value.substr(0, comma));
+        sink.put("\n\t");
+        value.remove_prefix(comma + 1);
     }
-    if (!value) {
-        output += line;
-        return;
-    }
-    output += line.substr(0, colon);
-    output += ": ";
-    appendValue(output, *value);
-    output += '\n';
+    sink.put(value);
+    sink.put('\n');
 }
 
 } // namespace
@@ -93,22 +88,31 @@ void parseMasterConfig(std::string_view bytes) {
     setting.end();
 }
 
-std::string formatMasterConfig(std::string_view masterTemplate) {
-    std::string output;
+std::vector<MasterLine> masterLines(std::string_view masterTemplate) {
+    std::vector<MasterLine> filled;
     LinePieces lines{masterTemplate};
     while (const std::optional<std::string_view> line = lines.next()) {
         if (line->front() == commentMark) {
-            output += *line;
+            filled.push_back({*line, std::nullopt});
         } else if (line->front() == keyMark) {
-            appendKeyLine(output, *line);
+            filled.push_back(keyLine(*line));
         }
     }
-    return output;
+    return filled;
+}
+
+void formatMasterConfig(const std::vector<MasterLine> &lines, ByteSink &sink) {
+    for (const MasterLine &line : lines) {
+        sink.put(line.text);
+        if (line.value) {
+            putValue(sink, *line.value);
+        }
+    }
 }
 
 int readMasterConfig() {
     const char *path = productPaths().master;
-    std::optional<std::string> bytes;
+    std::optional<FileBytes> bytes;
     try {
         bytes = readWholeFile(path);
         if (bytes) {
@@ -127,8 +131,10 @@ int readMasterConfig() {
 void writeMasterConfig() {
     try {
         if (const auto masterTemplate = readWholeFile(productPaths().masterTemplate)) {
-            rewriteFile(productPaths().master, formatMasterConfig(*masterTemplate));
+            const std::vector<MasterLine> lines = masterLines(*masterTemplate);
+            rewriteFile(productPaths().master,
+                        [&lines](ByteSink &sink) { formatMasterConfig(lines, sink); });
         }
-    } catch (const std::bad_alloc &) { // The file is not opened yet and stays as it was.
+    } catch (const std::bad_alloc &) { // Like every failed write: nothing is reported.
     }
 }

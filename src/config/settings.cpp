@@ -1,6 +1,27 @@
 #include "config/settings.h"
 
-Setting::Setting(SettingTable &table, const char *key) : key_{key} { table.all_.push_back(this); }
+#include <cstring>
+
+Setting::Setting(SettingTable &table, const char *key) : key_{key} {
+    const std::size_t length = std::strlen(key);
+    if (table.byLength_.size() <= length) {
+        table.byLength_.resize(length + 1);
+    }
+    table.byLength_[length].push_back(this);
+    table.all_.push_back(this);
+}
+
+Setting *SettingTable::find(const std::string &key) const {
+    const std::size_t length = std::strlen(key.c_str());
+    if (length < byLength_.size()) {
+        for (Setting *setting : byLength_[length]) {
+            if (compareNoCase(key.c_str(), setting->key()) == 0) {
+                return setting;
+            }
+        }
+    }
+    return nullptr;
+}
 
 Settings &settings() {
     static Settings store;
@@ -8,10 +29,6 @@ Settings &settings() {
 }
 
 std::optional<std::string> settingByKey(const std::string &key, TextOrNone text) {
-    for (Setting *setting : settings().all()) {
-        if (compareNoCase(key.c_str(), setting->key()) == 0) {
-            return setting->exchange(text);
-        }
-    }
-    return std::nullopt;
+    Setting *setting = settings().find(key);
+    return setting == nullptr ? std::nullopt : setting->exchange(text);
 }

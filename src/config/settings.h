@@ -35,10 +35,15 @@ public:
     ~SettingTable() = default;
 
     [[nodiscard]] const std::vector<Setting *> &all() const { return all_; }
+    /// The first setting whose key is the given one, letter case aside; null when there is none.
+    [[nodiscard]] Setting *find(const std::string &key) const;
 
 private:
     friend class Setting;
     std::vector<Setting *> all_;
+    /// The same by the length of their keys: whatever the locale holds for one letter in two
+    /// cases, equal keys are equally long.
+    std::vector<std::vector<Setting *>> byLength_;
 };
 
 /// What one unit in the file stands for in the store.

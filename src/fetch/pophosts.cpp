@@ -1,5 +1,7 @@
 #include "fetch/pophosts.h"
 
+#include "base/byteset.h"
+
 #include <algorithm>
 #include <new>
 
@@ -7,8 +9,8 @@ RecordChain<pop_host> pop_host_list;
 
 namespace {
 
-constexpr std::string_view separators = ":@,\r\n";
-constexpr std::string_view betweenEntries = ",\r\n";
+constexpr ByteSet separators{":@,\r\n"};
+constexpr ByteSet betweenEntries{",\r\n"};
 
 std::uint32_t takeFlags(std::string_view &text) {
     std::uint32_t flags = POP_HOST_STAR;
@@ -21,7 +23,7 @@ std::uint32_t takeFlags(std::string_view &text) {
 template <std::size_t size>
 void takeField(std::string_view &text, std::array<char, size> &field) {
     const std::string_view room = text.substr(0, size - 1);
-    const std::string_view taken = room.substr(0, room.find_first_of(separators));
+    const std::string_view taken = room.substr(0, separators.lengthBefore(room));
     setPopHostText(field, taken);
     text.remove_prefix(taken.size());
 }
@@ -56,7 +58,7 @@ void parsePopHosts(TextOrNone text) {
     RecordAppender<pop_host> end{&pop_host_list.head};
     try {
         for (;;) {
-            rest.remove_prefix(std::min(rest.find_first_not_of(betweenEntries), rest.size()));
+            rest.remove_prefix(betweenEntries.lengthOf(rest));
             if (rest.empty()) {
                 return;
             }

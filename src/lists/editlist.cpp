@@ -3,35 +3,46 @@
 #include "platform/knumericspinbox.h"
 #include "platform/lowscreen.h"
 #include "widgets/fieldtext.h"
-#include "widgets/listgroup.h"
 #include "widgets/numberfield.h"
-#include "widgets/pagelayout.h"
-#include "widgets/recordrows.h"
 
 #include <QCheckBox>
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QLineEdit>
-#include <QPushButton>
 #include <QScrollArea>
-
-#include <algorithm>
-#include <array>
 
 namespace {
 
-constexpr int highestTrigger = 1024;
-constexpr int buttonWidth = 60;
-constexpr int labelHeight = 20;
+constexpr int browseWidth = 60;
+constexpr int unitHeight = 20;
 constexpr int checkBoxHeight = 20;
 /// What rows keep around their text's height, in pixels, in a window that is too low for all.
 constexpr int aroundFieldText = 4;
 constexpr int aroundNumber = 6;
 constexpr int aroundCheckBoxText = 1;
-constexpr int leastBoxHeight = 40;
 constexpr QSize leastWindow{600, 350};
-constexpr std::uint32_t newListFlags = MAILLIST_OPEN | MAILLIST_MEMBERS_POST | MAILLIST_REPLY_TO |
-                                       MAILLIST_DIGEST | MAILLIST_BLOCK_MIME;
+
+struct TextRow {
+    TranslatableText caption;
+    KeptText maillist_entry::*field;
+};
+
+constexpr std::array<TextRow, 5> addressRows{
+    {{translatable("&Mail list Name:"), &maillist_entry::name},
+     {translatable("&Posting Address:"), &maillist_entry::post},
+     {translatable("&Subscribe Address:"), &maillist_entry::admin},
+     {translatable("&Support Address:"), &maillist_entry::support},
+     {translatable("&Moderator Address:"), &maillist_entry::modrt}}};
+
+struct FileRow {
+    TextRow text;
+    void (EditList::*browse)();
+};
+
+constexpr std::array<FileRow, 3> fileRows{
+    {{{translatable("&Info file:"), &maillist_entry::info}, &EditList::browseInfo},
+     {{translatable("&Header file:"), &maillist_entry::header}, &EditList::browseHeader},
+     {{translatable("&Footer file:"), &maillist_entry::footer}, &EditList::browseFooter}}};
 
 struct Option {
     const char *caption;
@@ -46,6 +57,26 @@ constexpr std::array<Option, 5> options{
      {"Block posts containing MIME attachments", MAILLIST_BLOCK_MIME},
      {"Allow digest subscriptions", MAILLIST_DIGEST}}};
 
+struct Trigger {
+    const char *caption;
+    const char *unit;
+    int unitWidth;
+    std::int32_t maillist_entry::*field;
+};
+
+constexpr int highestTrigger = 1024;
+constexpr std::array<Trigger, 2> triggers{
+    {{"Digest size trigger:", " kB", 30, &maillist_entry::diglen},
+     {"Digest count trigger:", " messages", 100, &maillist_entry::digno}}};
+
+maillist_entry newList() {
+    maillist_entry list;
+    for (const Option &option : options) {
+        list.flags |= option.bit;
+    }
+    return list;
+}
+
 /// A row of its own below those that are there already.
 QHBoxLayout *newRow(QVBoxLayout *rows) {
     if (rows->count() > 0) {
@@ -57,61 +88,49 @@ QHBoxLayout *newRow(QVBoxLayout *rows) {
     return row;
 }
 
-maillist_addr_entry copyOf(const maillist_addr_entry &entry) { return {entry.addr}; }
+/// The widgets below each other, with a group's spacing between them.
+QVBoxLayout *newSide(std::initializer_list<QWidget *> widgets) {
+    auto *side = new QVBoxLayout;
+    side->setSpacing(0);
+    for (QWidget *widget : widgets) {
+        if (side->count() > 0) {
+            addSpace(side, groupSpacing, Shrinking::Yes);
+        }
+        side->addWidget(widget);
+    }
+    return side;
+}
 
 } // namespace
 
-const std::array<EditList::TextRow, 5> EditList::addressRows{
-    {{translatable("&Mail list Name:"), &maillist_entry::name, nullptr},
-     {translatable("&Posting Address:"), &maillist_entry::post, nullptr},
-     {translatable("&Subscribe Address:"), &maillist_entry::admin, nullptr},
-     {translatable("&Support Address:"), &maillist_entry::support, nullptr},
-     {translatable("&Moderator Address:"), &maillist_entry::modrt, nullptr}}};
-
-const std::array<EditList::TextRow, 3> EditList::fileRows{
-    {{translatable("&Info file:"), &maillist_entry::info, &EditList::browseInfo},
-     {translatable("&Header file:"), &maillist_entry::header, &EditList::browseHeader},
-     {translatable("&Footer file:"), &maillist_entry::footer, &EditList::browseFooter}}};
-
 EditList::EditList(QWidget *parent, const char *name, const maillist_entry *list)
     : FormDialog(parent, name, "Mailing List", aroundFieldText) {
-    maillist_entry newList;
-    newList.flags = newListFlags;
-    const maillist_entry &shown = list != nullptr ? *list : newList;
+    const maillist_entry standard = newList();
+    const maillist_entry &shown = list != nullptr ? *list : standard;
+    QVBoxLayout *left = newSide({newTexts(shown), newOptions(shown)});
+    left->addStretch();
+    members_ = new AddressGroup("List Members", this,
+                                {&EditList::MemberAdd, &EditList::MemberModify,
+                                 &EditList::MemberRemove, &EditList::MemberSearch,
+                                 &EditList::MemberLoad, &EditList::MemberSelected},
+                                shown.member, addressShown);
+    allowed_ =
+        new AddressGroup("Allowed Posters", this,
+                         {&EditList::AllowAdd, &EditList::AllowModify, &EditList::AllowRemove,
+                          &EditList::AllowSearch, &EditList::AllowLoad, &EditList::AllowSelected},
+                         shown.allow, addressStored);
+    blocked_ =
+        new AddressGroup("Blocked Posters", this,
+                         {&EditList::BlockAdd, &EditList::BlockModify, &EditList::BlockRemove,
+                          &EditList::BlockSearch, &EditList::BlockLoad, &EditList::BlockSelected},
+                         shown.block, addressStored);
 
     auto *columns = new QWidget(this);
     auto *sides = new QHBoxLayout(columns);
-    auto *left = new QVBoxLayout;
-    auto *right = new QVBoxLayout;
     sides->setContentsMargins(0, 0, 0, 0);
     sides->setSpacing(groupSpacing);
     sides->addLayout(left, 150);
-    sides->addLayout(right, 300);
-    left->setSpacing(0);
-    right->setSpacing(0);
-    left->addWidget(newTextFields(shown));
-    addSpace(left, groupSpacing, Shrinking::Yes);
-    left->addWidget(newOptions(shown));
-    left->addStretch();
-    right->addWidget(newAddressGroup("List Members", members_, shown,
-                                     {&EditList::MemberAdd, &EditList::MemberModify,
-                                      &EditList::MemberRemove, &EditList::MemberSearch,
-                                      &EditList::MemberLoad, &EditList::MemberSelected}));
-    addSpace(right, groupSpacing, Shrinking::Yes);
-    right->addWidget(
-        newAddressGroup("Allowed Posters", allowed_, shown,
-                        {&EditList::AllowAdd, &EditList::AllowModify, &EditList::AllowRemove,
-                         &EditList::AllowSearch, &EditList::AllowLoad, &EditList::AllowSelected}));
-    addSpace(right, groupSpacing, Shrinking::Yes);
-    right->addWidget(
-        newAddressGroup("Blocked Posters", blocked_, shown,
-                        {&EditList::BlockAdd, &EditList::BlockModify, &EditList::BlockRemove,
-                         &EditList::BlockSearch, &EditList::BlockLoad, &EditList::BlockSelected}));
-    members_.box->setMinimumWidth(120);
-    appendRows(members_.box, members_.chain, addressShown);
-    appendRows(allowed_.box, allowed_.chain, addressStored);
-    appendRows(blocked_.box, blocked_.chain, addressStored);
-
+    sides->addLayout(newSide({members_, allowed_, blocked_}), 300);
     rows()->addWidget(columns);
     addButtons(pageBorder, pageBorder, Shrinking::Yes);
     const QSize room = roomFor(this);
@@ -122,30 +141,30 @@ EditList::EditList(QWidget *parent, const char *name, const maillist_entry *list
     resize(layout()->totalSizeHint().boundedTo(room));
 }
 
-QGroupBox *EditList::newTextFields(const maillist_entry &list) {
+QGroupBox *EditList::newTexts(const maillist_entry &list) {
     auto *group = new QGroupBox(QStringLiteral("List Addresses"), this);
     QVBoxLayout *rows = newGroupRows(group, Shrinking::Yes);
-    addTextFields(rows, 110, addressRows, list);
-    addTextFields(rows, 65, fileRows, list);
+    CaptionColumn addressCaptions{{110, 0}};
+    for (const auto &[caption, field] : addressRows) {
+        addText(newRow(rows), caption, addressCaptions, field, list);
+    }
+    CaptionColumn fileCaptions{{65, 0}};
+    for (std::size_t index = 0; index < fileRows.size(); ++index) {
+        const auto &[text, browse] = fileRows.at(index);
+        QHBoxLayout *row = newRow(rows);
+        files_.at(index) = addText(row, text.caption, fileCaptions, text.field, list);
+        connect(addBrowseButton(row, browseWidth, text.caption), &QPushButton::clicked, this,
+                browse);
+    }
     return group;
 }
 
-template <std::size_t count>
-void EditList::addTextFields(QVBoxLayout *rows, int labelWidth,
-                             const std::array<TextRow, count> &fields, const maillist_entry &list) {
-    CaptionColumn captions{{labelWidth, 0}};
-    for (const auto &[caption, field, browse] : fields) {
-        QHBoxLayout *row = newRow(rows);
-        texts_.push_back({addField(row, caption, captions, list.*field), field});
-        if (browse != nullptr) {
-            connect(addBrowseButton(row, buttonWidth, caption), &QPushButton::clicked, this,
-                    browse);
-        }
-    }
-}
-
-QLineEdit *EditList::fieldOf(std::string maillist_entry::*field) const {
-    return std::ranges::find(texts_, field, &TextField::field)->edit;
+QLineEdit *EditList::addText(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
+                             KeptText maillist_entry::*field, const maillist_entry &list) {
+    QLineEdit *edit = addField(row, caption, captions, list.*field);
+    stores_.emplace_back(
+        [edit, field](maillist_entry &record) { record.*field = fieldText(edit, record.*field); });
+    return edit;
 }
 
 QGroupBox *EditList::newOptions(const maillist_entry &list) {
@@ -155,57 +174,32 @@ QGroupBox *EditList::newOptions(const maillist_entry &list) {
         auto *box = new QCheckBox(QString::fromUtf8(caption), group);
         box->setChecked((list.flags & bit) != 0);
         addOfHeight(newRow(rows), box, checkBoxHeight, aroundCheckBoxText);
-        options_.push_back({box, bit});
+        stores_.emplace_back([box, bit = bit](maillist_entry &record) {
+            record.flags = box->isChecked() ? record.flags | bit : record.flags & ~bit;
+        });
     }
-    CaptionColumn captions{{120, labelHeight}};
-    addTrigger(newRow(rows), "Digest size trigger:", captions, {" kB", 30}, &maillist_entry::diglen,
-               list);
-    addTrigger(newRow(rows), "Digest count trigger:", captions, {" messages", 100},
-               &maillist_entry::digno, list);
-    return group;
-}
-
-void EditList::addTrigger(QHBoxLayout *row, const char *caption, CaptionColumn &captions,
-                          const Unit &unit, std::int32_t maillist_entry::*field,
-                          const maillist_entry &list) {
-    KNumericSpinBox *box = newNumberField(this, 0, highestTrigger, list.*field);
-    // With an alignment the labels' fixed height does not hold the row's down.
-    row->addWidget(captions.newCaption(QString::fromUtf8(caption), box), 0, Qt::AlignVCenter);
-    addOfHeight(row, box, fieldHeight, aroundNumber);
-    QLabel *unitLabel = newLabel(QString::fromUtf8(unit.caption), {unit.width, labelHeight}, this);
-    unitLabel->setBuddy(box);
-    row->addWidget(unitLabel, 0, Qt::AlignVCenter);
-    row->addStretch();
-    triggers_.push_back({box, field});
-}
-
-ListGroup *EditList::newAddressGroup(const char *caption, Addresses &addresses,
-                                     const maillist_entry &list, const AddressSlots &slotsOf) {
-    auto *group = new ListGroup(caption, {1000, 0}, this, Shrinking::Yes);
-    group->box()->setMinimumHeight(leastBoxHeight);
-    // The box takes what height there is; only the buttons beside it ask for some.
-    group->box()->setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Ignored);
-    group->addEditButtons(this, slotsOf.add, slotsOf.modify, slotsOf.remove, slotsOf.selected);
-    connect(group->addButton("Search..."), &QPushButton::clicked, this, slotsOf.search);
-    connect(group->addButton("Load File"), &QPushButton::clicked, this, slotsOf.load);
-    group->fixColumnWidth(buttonWidth);
-    group->column()->addStretch();
-    addresses.box = group->box();
-    addresses.chain = (list.*addresses.field).copied(copyOf);
+    CaptionColumn captions{{120, unitHeight}};
+    for (const auto &[caption, unit, unitWidth, field] : triggers) {
+        KNumericSpinBox *box = newNumberField(this, 0, highestTrigger, list.*field);
+        QHBoxLayout *row = newRow(rows);
+        // With an alignment the labels' fixed height does not hold the row's down.
+        row->addWidget(captions.newCaption(QString::fromUtf8(caption), box), 0, Qt::AlignVCenter);
+        addOfHeight(row, box, fieldHeight, aroundNumber);
+        QLabel *unitLabel = newLabel(QString::fromUtf8(unit), {unitWidth, unitHeight}, this);
+        unitLabel->setBuddy(box);
+        row->addWidget(unitLabel, 0, Qt::AlignVCenter);
+        row->addStretch();
+        stores_.emplace_back(
+            [box, field = field](maillist_entry &record) { record.*field = box->getValue(); });
+    }
     return group;
 }
 
 void EditList::store(maillist_entry &list) {
-    for (const auto &[edit, field] : texts_) {
-        list.*field = fieldBytes(edit);
+    for (const auto &storeWidget : stores_) {
+        storeWidget(list);
     }
-    for (const auto &[box, field] : triggers_) {
-        list.*field = box->getValue();
-    }
-    for (const auto &[box, bit] : options_) {
-        list.flags = box->isChecked() ? list.flags | bit : list.flags & ~bit;
-    }
-    for (Addresses *addresses : {&members_, &allowed_, &blocked_}) {
-        list.*addresses->field = std::move(addresses->chain);
-    }
+    list.member = members_->takeChain();
+    list.allow = allowed_->takeChain();
+    list.block = blocked_->takeChain();
 }

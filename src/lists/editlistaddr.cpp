@@ -7,9 +7,9 @@
 EditListAddr::EditListAddr(QWidget *parent, const char *name, const maillist_addr_entry *entry)
     : FormDialog(parent, name, "Mail List Address"),
       email_{addField(translatable("&Email:"), listDialogLabel,
-                      entry != nullptr ? std::string_view{entry->addr} : "")} {
+                      entry != nullptr ? entry->addr : KeptText{})} {
     addButtons(listDialogBorder, 20);
     fixSize(listDialogSize, listDialogSize);
 }
 
-std::string EditListAddr::email() const { return fieldBytes(email_); }
+KeptText EditListAddr::email(KeptText before) const { return fieldText(email_, before); }

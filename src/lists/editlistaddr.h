@@ -1,8 +1,7 @@
 #pragma once
 
+#include "base/kepttext.h"
 #include "widgets/formdialog.h"
-
-#include <string>
 
 struct maillist_addr_entry;
 
@@ -14,7 +13,8 @@ public:
     /// `entry` is what the field starts with; null for an empty field.
     EditListAddr(QWidget *parent, const char *name, const maillist_addr_entry *entry);
 
-    [[nodiscard]] std::string email() const;
+    /// As a record takes it that holds `before`.
+    [[nodiscard]] KeptText email(KeptText before) const;
 
 private:
     QLineEdit *email_;

@@ -19,7 +19,7 @@ constexpr int spaceAroundDigest = 10;
 EditListMember::EditListMember(QWidget *parent, const char *name, const maillist_addr_entry *entry)
     : FormDialog(parent, name, "Mail List Address"),
       email_{addField(translatable("&Email:"), listDialogLabel,
-                      entry != nullptr ? addressShown(*entry) : std::string_view{})},
+                      entry != nullptr ? addressShown(*entry) : KeptText{})},
       digest_{new QCheckBox(QStringLiteral("Digest List"))} {
     digest_->setFixedHeight(leastSize(digest_, {0, checkBoxHeight}).height());
     digest_->setChecked(entry != nullptr && isOnDigest(*entry));
@@ -29,8 +29,11 @@ EditListMember::EditListMember(QWidget *parent, const char *name, const maillist
     fixSize(dialogSize, dialogSize);
 }
 
-std::string EditListMember::addr() const {
-    std::string addr{digest_->isChecked() ? ":" : ""};
-    addr += fieldBytes(email_);
-    return addr;
+KeptText EditListMember::addr(const maillist_addr_entry &before) const {
+    const KeptText address = fieldText(email_, addressShown(before));
+    if (!digest_->isChecked()) {
+        return address;
+    }
+    const bool isUnchanged = isOnDigest(before) && address.data() == addressShown(before).data();
+    return isUnchanged ? before.addr : keep(':' + std::string{address});
 }

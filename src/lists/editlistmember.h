@@ -1,8 +1,7 @@
 #pragma once
 
+#include "base/kepttext.h"
 #include "widgets/formdialog.h"
-
-#include <string>
 
 class QCheckBox;
 struct maillist_addr_entry;
@@ -15,8 +14,8 @@ public:
     /// `entry` is what the dialog starts with; null for an empty field and no digest.
     EditListMember(QWidget *parent, const char *name, const maillist_addr_entry *entry);
 
-    /// As a record holds it: behind ":" for a member on the digest.
-    [[nodiscard]] std::string addr() const;
+    /// As a record takes it that holds `before`: behind ":" for a member on the digest.
+    [[nodiscard]] KeptText addr(const maillist_addr_entry &before) const;
 
 private:
     QLineEdit *email_;

@@ -12,9 +12,10 @@
 #include <QMessageBox>
 #include <QPushButton>
 
+#include <algorithm>
 #include <new>
 
-// What the buttons of the editor do; its window is made in editlist.cpp.
+// What the buttons of the editor do to any of its lists; its window is made in editlist.cpp.
 
 namespace {
 
@@ -26,7 +27,7 @@ std::optional<int> nextRowHolding(const QListBox *box, const std::string &needle
     const int tested = current ? count - 1 : count;
     for (int step = 0; step < tested; ++step) {
         const int row = (current.value_or(-1) + 1 + step) % count;
-        if (box->text(row).find(needle) != std::string::npos) {
+        if (box->text(row).find(needle) != std::string_view::npos) {
             return row;
         }
     }
@@ -45,52 +46,10 @@ void showUnreadable(QWidget *editor) {
 }
 
 void readMember(EditList * /*editor*/, maillist_addr_entry *entry, EditListMember *dialog) {
-    entry->addr = dialog->addr();
+    entry->addr = dialog->addr(*entry);
 }
 
 } // namespace
-
-void EditList::MemberAdd() { AddMember(members_.box, &members_.chain.head); }
-
-void EditList::MemberRemove() { Remove(members_.box, &members_.chain.head); }
-
-void EditList::MemberSelected(const char *text) {
-    SelectedMember(members_.box, &members_.chain.head, text);
-}
-
-void EditList::MemberModify() { MemberSelected(currentText(members_.box)); }
-
-void EditList::MemberSearch() { Search(members_.box, &members_.chain.head); }
-
-void EditList::MemberLoad() { Load(members_.box, &members_.chain.head); }
-
-void EditList::AllowAdd() { Add(allowed_.box, &allowed_.chain.head); }
-
-void EditList::AllowRemove() { Remove(allowed_.box, &allowed_.chain.head); }
-
-void EditList::AllowSelected(const char *text) {
-    Selected(allowed_.box, &allowed_.chain.head, text);
-}
-
-void EditList::AllowModify() { AllowSelected(currentText(allowed_.box)); }
-
-void EditList::AllowSearch() { Search(allowed_.box, &allowed_.chain.head); }
-
-void EditList::AllowLoad() { Load(allowed_.box, &allowed_.chain.head); }
-
-void EditList::BlockAdd() { Add(blocked_.box, &blocked_.chain.head); }
-
-void EditList::BlockRemove() { Remove(blocked_.box, &blocked_.chain.head); }
-
-void EditList::BlockSelected(const char *text) {
-    Selected(blocked_.box, &blocked_.chain.head, text);
-}
-
-void EditList::BlockModify() { BlockSelected(currentText(blocked_.box)); }
-
-void EditList::BlockSearch() { Search(blocked_.box, &blocked_.chain.head); }
-
-void EditList::BlockLoad() { Load(blocked_.box, &blocked_.chain.head); }
 
 void EditList::Add(QListBox *box, maillist_addr_entry **chain) {
     addByDialog<EditListAddr>(this, box, chain, &EditList::Read, addressStored);
@@ -128,38 +87,30 @@ void EditList::Load(QListBox *box, maillist_addr_entry **chain) {
     if (dialog.exec() != QDialog::Accepted) {
         return;
     }
-    std::vector<std::string> rows;
-    AddressChain loaded;
     try {
-        const std::optional<std::string> bytes = readWholeFile(dialog.fileName());
-        if (!bytes) {
+        const std::optional<FileBytes> file = readWholeFile(dialog.fileName());
+        if (!file) {
             showUnreadable(this);
             return;
         }
-        rows = parseAddressLines(*bytes);
-        for (const std::string &address : rows) {
-            prependRecord(&loaded.head, {address});
+        AddressChain loaded = parseAddressLines(*file);
+        std::vector<std::string_view> rows;
+        for (const maillist_addr_entry &address : loaded) {
+            rows.push_back(address.addr);
+        }
+        std::ranges::reverse(rows); // The file's first address is the chain's last.
+        box->reserve(rows);
+        prependChain(chain, std::move(loaded));
+        box->append(rows);
+        if (!rows.empty()) {
+            box->showRow(box->count() - 1);
         }
     } catch (const std::bad_alloc &) { // Then nothing is loaded, rather than a part.
-        return;
     }
-    box->setUpdatesEnabled(false);
-    prependChain(chain, std::move(loaded));
-    box->append(std::move(rows));
-    if (box->count() > 0) {
-        box->showRow(box->count() - 1);
-    }
-    box->setUpdatesEnabled(true);
 }
 
 void EditList::Read(maillist_addr_entry *entry, EditListAddr *dialog) {
     if (entry != nullptr && dialog != nullptr) {
-        entry->addr = dialog->email();
+        entry->addr = dialog->email(entry->addr);
     }
 }
-
-void EditList::browseInfo() { browseForFile(fieldOf(&maillist_entry::info), this); }
-
-void EditList::browseHeader() { browseForFile(fieldOf(&maillist_entry::header), this); }
-
-void EditList::browseFooter() { browseForFile(fieldOf(&maillist_entry::footer), this); }

@@ -13,7 +13,7 @@ constexpr std::size_t longestLoadedPiece = 254;
 
 struct TextKey {
     std::string_view key;
-    std::string maillist_entry::*field;
+    KeptText maillist_entry::*field;
 };
 
 /// In the order of the written block. The info file stands twice: that is how the file is.
@@ -59,7 +59,7 @@ AddressChain *sectionOpened(maillist_entry &list, std::string_view startLine) {
     return nullptr;
 }
 
-void setField(maillist_entry &list, std::string_view line) {
+void setField(maillist_entry &list, KeptText line) {
     for (const auto &[key, field] : textKeys) {
         if (line.starts_with(key)) {
             list.*field = line.substr(key.size());
@@ -82,7 +82,7 @@ class BlockReader {
 public:
     explicit BlockReader(RecordChain<maillist_entry> &lists) : lists_{lists} {}
 
-    void take(std::string_view piece) {
+    void take(KeptText piece) {
         if (section_ != nullptr) {
             takeAddress(piece);
         } else if (list_ != nullptr) {
@@ -93,15 +93,15 @@ public:
     }
 
 private:
-    void takeAddress(std::string_view piece) {
+    void takeAddress(KeptText piece) {
         if (piece.starts_with('#')) {
             section_ = nullptr;
         } else {
-            prependRecord(&section_->head, {std::string{lineText(piece)}});
+            prependRecord(&section_->head, {lineText(piece)});
         }
     }
 
-    void takeLine(std::string_view line) {
+    void takeLine(KeptText line) {
         if (line.starts_with("#endlist")) {
             list_ = nullptr;
         } else if (line.starts_with("#start")) {
@@ -117,61 +117,59 @@ private:
     AddressChain *section_ = nullptr;
 };
 
-void appendLine(std::string &bytes, std::string_view key, std::string_view value) {
-    bytes += key;
-    bytes += value;
-    bytes += '\n';
+void putLine(ByteSink &sink, std::string_view key, std::string_view value = {}) {
+    sink.put(key);
+    sink.put(value);
+    sink.put('\n');
 }
 
-void appendSection(std::string &bytes, std::string_view name, const AddressChain &addresses) {
-    appendLine(bytes, "#start ", name);
+void putSection(ByteSink &sink, std::string_view name, const AddressChain &addresses) {
+    putLine(sink, "#start ", name);
     for (const maillist_addr_entry &address : addresses) {
         if (!address.addr.starts_with('#')) {
-            appendLine(bytes, {}, address.addr);
+            putLine(sink, address.addr);
         }
     }
-    appendLine(bytes, {}, "#end");
+    putLine(sink, "#end");
 }
 
-void appendList(std::string &bytes, const maillist_entry &list) {
-    appendLine(bytes, {}, "#new");
+void putList(ByteSink &sink, const maillist_entry &list) {
+    putLine(sink, "#new");
     for (const auto &[key, field] : textKeys) {
-        appendLine(bytes, key, list.*field);
+        putLine(sink, key, list.*field);
     }
     for (const auto &[key, field] : numberKeys) {
-        appendLine(bytes, key, formatSigned(list.*field));
+        putLine(sink, key, formatSigned(list.*field));
     }
-    appendLine(bytes, flagsKey, formatUnsigned(list.flags));
+    putLine(sink, flagsKey, formatUnsigned(list.flags));
     for (const auto &[name, chain] : sections) {
-        appendSection(bytes, name, list.*chain);
+        putSection(sink, name, list.*chain);
     }
-    bytes += "#endlist\n\n\n";
+    sink.put("#endlist\n\n\n");
 }
 
 } // namespace
 
-void parseMailLists(std::string_view bytes, RecordChain<maillist_entry> &lists) {
+void parseMailLists(KeptText bytes, RecordChain<maillist_entry> &lists) {
     BlockReader reader{lists};
     LinePieces pieces{bytes, longestPiece};
-    while (const std::optional<std::string_view> piece = pieces.next()) {
+    while (const std::optional<KeptText> piece = pieces.next()) {
         reader.take(*piece);
     }
 }
 
-std::string formatMailLists(const RecordChain<maillist_entry> &lists) {
-    std::string bytes;
+void formatMailLists(const RecordChain<maillist_entry> &lists, ByteSink &sink) {
     for (const maillist_entry &list : lists) {
-        appendList(bytes, list);
+        putList(sink, list);
     }
-    return bytes;
 }
 
-std::vector<std::string> parseAddressLines(std::string_view bytes) {
-    std::vector<std::string> addresses;
+AddressChain parseAddressLines(std::string_view bytes) {
+    AddressChain addresses;
     LinePieces pieces{bytes, longestLoadedPiece};
     while (const std::optional<std::string_view> piece = pieces.next()) {
         if (beforeNul(*piece).find('@') != std::string_view::npos) {
-            addresses.emplace_back(lineText(*piece));
+            prependRecord(&addresses.head, {keep(lineText(*piece))});
         }
     }
     return addresses;
@@ -188,5 +186,6 @@ void readMailListFile() {
 }
 
 void writeMailListFile() {
-    rewriteDataFile(settings().mail_file_maillist, [] { return formatMailLists(maillist_list); });
+    rewriteDataFile(settings().mail_file_maillist,
+                    [](ByteSink &sink) { formatMailLists(maillist_list, sink); });
 }

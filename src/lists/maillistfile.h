@@ -1,11 +1,11 @@
 #pragma once
 
+#include "base/bytesink.h"
+#include "base/kepttext.h"
 #include "base/recordlist.h"
 
 #include <cstdint>
-#include <string>
 #include <string_view>
-#include <vector>
 
 /// The mailing-list file: one block a list, keys in the first column, values without a blank before
 /// them, then the three address lists:
@@ -24,7 +24,7 @@
 /// chains, so that reading and writing reverse their order.
 
 struct maillist_addr_entry {
-    std::string addr;
+    KeptText addr;
     maillist_addr_entry *next = nullptr;
 };
 
@@ -32,11 +32,11 @@ struct maillist_addr_entry {
 inline bool isOnDigest(const maillist_addr_entry &member) { return member.addr.starts_with(':'); }
 
 /// An address as its record holds it.
-inline std::string_view addressStored(const maillist_addr_entry &entry) { return entry.addr; }
+inline KeptText addressStored(const maillist_addr_entry &entry) { return entry.addr; }
 
 /// A member's address proper.
-inline std::string_view addressShown(const maillist_addr_entry &member) {
-    return std::string_view{member.addr}.substr(isOnDigest(member) ? 1 : 0);
+inline KeptText addressShown(const maillist_addr_entry &member) {
+    return member.addr.substr(isOnDigest(member) ? 1 : 0);
 }
 
 using AddressChain = RecordChain<maillist_addr_entry>;
@@ -48,14 +48,14 @@ constexpr std::uint32_t MAILLIST_DIGEST = 16;
 constexpr std::uint32_t MAILLIST_BLOCK_MIME = 32;
 
 struct maillist_entry {
-    std::string name;
-    std::string post;
-    std::string admin; ///< Where people subscribe.
-    std::string support;
-    std::string footer; ///< This and the next: path of a file.
-    std::string header;
-    std::string modrt;       ///< The moderator's address.
-    std::string info;        ///< Path of a file.
+    KeptText name;
+    KeptText post;
+    KeptText admin; ///< Where people subscribe.
+    KeptText support;
+    KeptText footer; ///< This and the next: path of a file.
+    KeptText header;
+    KeptText modrt;          ///< The moderator's address.
+    KeptText info;           ///< Path of a file.
     std::int32_t diglen = 0; ///< kB
     std::int32_t digno = 0;  ///< Messages.
     std::int32_t digcnt =
@@ -72,15 +72,16 @@ extern RecordChain<maillist_entry> maillist_list;
 
 /// Puts the lists of the file's bytes at the head of `lists`. Throws std::bad_alloc with what was
 /// read until then in the chain.
-void parseMailLists(std::string_view bytes, RecordChain<maillist_entry> &lists);
+void parseMailLists(KeptText bytes, RecordChain<maillist_entry> &lists);
 
 /// Addresses that begin with "#" are left out: such a line would end its section and take the
 /// addresses behind it along.
-std::string formatMailLists(const RecordChain<maillist_entry> &lists);
+void formatMailLists(const RecordChain<maillist_entry> &lists, ByteSink &sink);
 
-/// The addresses of a plain text file, in its order: every line that holds "@", whole. A line is
-/// taken in pieces of at most 254 bytes. Throws std::bad_alloc.
-std::vector<std::string> parseAddressLines(std::string_view bytes);
+/// The addresses of a plain text file: every line that holds "@", whole. A line is taken in pieces
+/// of at most 254 bytes, and each address is put at the head. They alone are kept. Throws
+/// std::bad_alloc.
+AddressChain parseAddressLines(std::string_view bytes);
 
 /// Fills maillist_list anew from the file; empty when it cannot be read.
 void readMailListFile();

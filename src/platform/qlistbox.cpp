@@ -13,7 +13,6 @@
 #include <QToolTip>
 
 #include <algorithm>
-#include <iterator>
 
 namespace {
 
@@ -22,61 +21,109 @@ constexpr std::size_t mostBytesShown = 1024;
 
 } // namespace
 
+/// The texts stand in one buffer, each with a NUL behind it, and the rows say where. A text that
+/// was replaced or removed keeps its bytes there until the list goes.
 class QListBox::Rows : public QAbstractListModel {
 public:
     using QAbstractListModel::QAbstractListModel;
 
     [[nodiscard]] int rowCount(const QModelIndex &parent = {}) const override {
-        return parent.isValid() ? 0 : static_cast<int>(texts_.size());
+        return parent.isValid() ? 0 : static_cast<int>(rows_.size());
+    }
+
+    /// The view asks for every row's index whenever it lays the list out; the inherited way takes
+    /// several calls more.
+    [[nodiscard]] QModelIndex index(int row, int column = 0,
+                                    const QModelIndex &parent = {}) const override {
+        const bool exists = row >= 0 && static_cast<std::size_t>(row) < rows_.size();
+        return exists && column == 0 && !parent.isValid() ? createIndex(row, 0) : QModelIndex{};
     }
 
     [[nodiscard]] QVariant data(const QModelIndex &index, int role) const override {
         if (!index.isValid() || (role != Qt::DisplayRole && role != Qt::ToolTipRole)) {
             return {};
         }
-        const QString text =
-            textFromBytes(std::string_view{at(index.row())}.substr(0, mostBytesShown));
+        const QString text = textFromBytes(at(index.row()).substr(0, mostBytesShown));
         return role == Qt::ToolTipRole && Qt::mightBeRichText(text) ? text.toHtmlEscaped() : text;
     }
 
-    [[nodiscard]] const std::string &at(int row) const {
-        return texts_.at(static_cast<std::size_t>(row));
+    [[nodiscard]] std::string_view at(int row) const {
+        const Row &place = rows_.at(static_cast<std::size_t>(row));
+        return {texts_.data() + place.begin, place.length};
     }
 
-    void append(std::vector<std::string> texts) {
+    void reserve(const std::vector<std::string_view> &texts) {
+        std::size_t length = texts_.size() + texts.size();
+        for (const std::string_view text : texts) {
+            length += text.size();
+        }
+        makeRoom(texts_, length);
+        makeRoom(rows_, rows_.size() + texts.size());
+    }
+
+    void append(const std::vector<std::string_view> &texts) {
         if (texts.empty()) {
             return;
         }
+        reserve(texts); // What can fail comes before the views hear of new rows.
         const int first = rowCount();
         beginInsertRows({}, first, first + static_cast<int>(texts.size()) - 1);
-        texts_.insert(texts_.end(), std::make_move_iterator(texts.begin()),
-                      std::make_move_iterator(texts.end()));
+        for (const std::string_view text : texts) {
+            rows_.push_back(placed(text));
+        }
         endInsertRows();
     }
 
-    void change(int row, std::string text) {
-        texts_.at(static_cast<std::size_t>(row)) = std::move(text);
+    void change(int row, std::string_view text) {
+        rows_.at(static_cast<std::size_t>(row)) = placed(text);
         emit dataChanged(index(row), index(row));
     }
 
     void remove(int row) {
         beginRemoveRows({}, row, row);
-        texts_.erase(texts_.begin() + row);
+        rows_.erase(rows_.begin() + row);
         endRemoveRows();
     }
 
 private:
-    std::vector<std::string> texts_;
+    struct Row {
+        std::size_t begin; ///< In `texts_`.
+        std::size_t length;
+    };
+
+    /// With an eighth to spare: doubling the room of a long list for one row more would be seen.
+    template <class Container>
+    static void makeRoom(Container &container, std::size_t size) {
+        if (size > container.capacity()) {
+            container.reserve(size + size / 8);
+        }
+    }
+
+    Row placed(std::string_view text) {
+        makeRoom(texts_, texts_.size() + text.size() + 1);
+        const Row row{texts_.size(), text.size()};
+        texts_.append(text).push_back('\0');
+        return row;
+    }
+
+    std::string texts_;
+    std::vector<Row> rows_;
 };
 
-/// Rows ask for no width: the list has that of its window, and a longer text ends in dots.
+/// Rows ask for no width: the list has that of its window, and a longer text ends in dots. Their
+/// height is the font's, whatever they hold: a changed text lays nothing out anew.
 class QListBox::RowDelegate : public QStyledItemDelegate {
 public:
     using QStyledItemDelegate::QStyledItemDelegate;
 
     [[nodiscard]] QSize sizeHint(const QStyleOptionViewItem &option,
-                                 const QModelIndex &index) const override {
-        return {0, QStyledItemDelegate::sizeHint(option, index).height()};
+                                 const QModelIndex & /*index*/) const override {
+        QStyleOptionViewItem row = option;
+        row.features |= QStyleOptionViewItem::HasDisplay;
+        row.text = QStringLiteral("x");
+        const QWidget *list = option.widget;
+        return {0,
+                list->style()->sizeFromContents(QStyle::CT_ItemViewItem, &row, {}, list).height()};
     }
 
     [[nodiscard]] int textWidth(const QStyleOptionViewItem &option,
@@ -96,18 +143,18 @@ QListBox::QListBox(QWidget *parent) : QListView(parent), rows_{new Rows(this)} {
 
 int QListBox::count() const { return rows_->rowCount(); }
 
-const std::string &QListBox::text(int row) const { return rows_->at(row); }
+std::string_view QListBox::text(int row) const { return rows_->at(row); }
 
-void QListBox::append(std::string text) {
-    std::vector<std::string> texts;
-    texts.push_back(std::move(text));
-    append(std::move(texts));
+void QListBox::append(std::string_view text) {
+    append(std::vector{text});
     showRow(count() - 1);
 }
 
-void QListBox::append(std::vector<std::string> texts) { rows_->append(std::move(texts)); }
+void QListBox::append(const std::vector<std::string_view> &texts) { rows_->append(texts); }
 
-void QListBox::changeText(int row, std::string text) { rows_->change(row, std::move(text)); }
+void QListBox::reserve(const std::vector<std::string_view> &texts) { rows_->reserve(texts); }
+
+void QListBox::changeText(int row, std::string_view text) { rows_->change(row, text); }
 
 void QListBox::remove(int row) {
     const bool wasCurrent = currentRow() == row;
@@ -130,6 +177,12 @@ void QListBox::setCurrentRow(int row) { setCurrentIndex(rows_->index(row)); }
 void QListBox::showRow(int row) { scrollTo(rows_->index(row)); }
 
 void QListBox::setTopRow(int row) { scrollTo(rows_->index(row), PositionAtTop); }
+
+void QListBox::dataChanged(const QModelIndex &first, const QModelIndex &last,
+                           const QList<int> &roles) {
+    // The inherited way lays all rows out anew.
+    QAbstractItemView::dataChanged(first, last, roles);
+}
 
 void QListBox::focusInEvent(QFocusEvent *event) {
     if (currentIndex().isValid()) {
@@ -202,6 +255,6 @@ QItemSelectionModel::SelectionFlags QListBox::selectionCommand(const QModelIndex
 }
 
 void QListBox::emitSelected(int row) {
-    const std::string chosen = text(row); // The row may change while the signal is answered.
+    const std::string chosen{text(row)}; // The row may change while the signal is answered.
     emit selected(chosen.c_str());
 }

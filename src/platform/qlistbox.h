@@ -3,7 +3,7 @@
 #include <QListView>
 
 #include <optional>
-#include <string>
+#include <string_view>
 #include <vector>
 
 /// A list of one byte text a row. The current row is always the highlighted one, and there is none
@@ -18,13 +18,18 @@ public:
 
     [[nodiscard]] int count() const;
     /// `row` is 0 to count() - 1; so in all that follows.
-    [[nodiscard]] const std::string &text(int row) const;
+    /// A NUL stands behind it. Valid until the list changes.
+    [[nodiscard]] std::string_view text(int row) const;
+
+    // A text that is given to the list must not be one of its own.
 
     /// Adds a row and scrolls it into sight, without choosing it.
-    void append(std::string text);
+    void append(std::string_view text);
     /// Adds many rows with one repaint; does not scroll.
-    void append(std::vector<std::string> texts);
-    void changeText(int row, std::string text);
+    void append(const std::vector<std::string_view> &texts);
+    /// Gets the memory that `append` needs for these texts. Throws std::bad_alloc; the rows stay.
+    void reserve(const std::vector<std::string_view> &texts);
+    void changeText(int row, std::string_view text);
     /// When the current row goes, the one that takes its place, or else the last, becomes current.
     void remove(int row);
 
@@ -43,6 +48,8 @@ signals:
     void selected(const char *text);
 
 protected:
+    void dataChanged(const QModelIndex &first, const QModelIndex &last,
+                     const QList<int> &roles) override;
     void currentChanged(const QModelIndex &current, const QModelIndex &previous) override;
     void focusInEvent(QFocusEvent *event) override;
     void keyPressEvent(QKeyEvent *event) override;

@@ -1,8 +1,7 @@
 #pragma once
 
+#include "base/kepttext.h"
 #include "widgets/formdialog.h"
-
-#include <string>
 
 struct smtpreject_entry;
 
@@ -14,7 +13,8 @@ public:
     /// `entry` is what the field starts with; null for an empty field.
     EditSMTP(QWidget *parent, const char *name, const smtpreject_entry *entry);
 
-    [[nodiscard]] std::string address() const;
+    /// As a record takes it that holds `before`.
+    [[nodiscard]] KeptText address(KeptText before) const;
 
 private:
     QLineEdit *address_;

@@ -48,6 +48,6 @@ void MailSMTP::Modify() { Selected(currentText(rejects_)); }
 
 void MailSMTP::Read(smtpreject_entry *entry, EditSMTP *dialog) {
     if (entry != nullptr && dialog != nullptr) {
-        entry->domain = dialog->address();
+        entry->domain = dialog->address(entry->domain);
     }
 }

@@ -2,7 +2,6 @@
 
 #include "config/datafile.h"
 
-#include <algorithm>
 #include <cctype>
 
 RecordChain<smtpreject_entry> smtpreject_list;
@@ -11,32 +10,30 @@ namespace {
 
 constexpr std::size_t longestPiece = 249;
 
-bool beginsEntry(char first) {
-    return std::isgraph(static_cast<unsigned char>(first)) != 0 && first != '#' && first != '|';
+bool beginsEntry(unsigned char first) {
+    return std::isgraph(first) != 0 && first != '#' && first != '|';
 }
 
-bool isSpace(char character) { return std::isspace(static_cast<unsigned char>(character)) != 0; }
+bool endsWord(unsigned char character) { return character == '\0' || std::isspace(character) != 0; }
 
 } // namespace
 
-void parseSmtpRejects(std::string_view bytes, RecordChain<smtpreject_entry> &list) {
+void parseSmtpRejects(KeptText bytes, RecordChain<smtpreject_entry> &list) {
+    const ByteSet beginnings = ByteSet::of(beginsEntry);
+    const ByteSet wordEnds = ByteSet::of(endsWord);
     LinePieces pieces{bytes, longestPiece};
-    while (const std::optional<std::string_view> piece = pieces.next()) {
-        const std::string_view text = beforeNul(*piece);
-        if (!text.empty() && beginsEntry(text.front())) {
-            prependRecord(&list.head,
-                          {std::string{text.begin(), std::ranges::find_if(text, isSpace)}});
+    while (const std::optional<KeptText> piece = pieces.next()) {
+        if (beginnings.holds(piece->front())) {
+            prependRecord(&list.head, {piece->substr(0, wordEnds.lengthBefore(*piece))});
         }
     }
 }
 
-std::string formatSmtpRejects(const RecordChain<smtpreject_entry> &list) {
-    std::string bytes;
+void formatSmtpRejects(const RecordChain<smtpreject_entry> &list, ByteSink &sink) {
     for (const smtpreject_entry &entry : list) {
-        bytes += entry.domain;
-        bytes += '\n';
+        sink.put(entry.domain);
+        sink.put('\n');
     }
-    return bytes;
 }
 
 void readSmtpRejectFile() {
@@ -51,5 +48,5 @@ void readSmtpRejectFile() {
 
 void writeSmtpRejectFile() {
     rewriteDataFile(settings().mail_file_smtpreject,
-                    [] { return formatSmtpRejects(smtpreject_list); });
+                    [](ByteSink &sink) { formatSmtpRejects(smtpreject_list, sink); });
 }

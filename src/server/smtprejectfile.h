@@ -1,9 +1,8 @@
 #pragma once
 
+#include "base/bytesink.h"
+#include "base/kepttext.h"
 #include "base/recordlist.h"
-
-#include <string>
-#include <string_view>
 
 /// The SMTP server's block list, one word a line:
 ///
@@ -13,7 +12,7 @@
 /// Reading puts each entry at the head, so that reading and writing reverse the order.
 
 struct smtpreject_entry {
-    std::string domain;
+    KeptText domain;
     smtpreject_entry *next = nullptr;
 };
 
@@ -22,8 +21,8 @@ extern RecordChain<smtpreject_entry> smtpreject_list;
 
 /// Puts the entries of the file's bytes at the head of `list`. Throws std::bad_alloc with what was
 /// read until then in the list.
-void parseSmtpRejects(std::string_view bytes, RecordChain<smtpreject_entry> &list);
-std::string formatSmtpRejects(const RecordChain<smtpreject_entry> &list);
+void parseSmtpRejects(KeptText bytes, RecordChain<smtpreject_entry> &list);
+void formatSmtpRejects(const RecordChain<smtpreject_entry> &list, ByteSink &sink);
 
 /// Fills smtpreject_list anew from the file; empty when it cannot be read.
 void readSmtpRejectFile();

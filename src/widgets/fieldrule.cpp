@@ -1,6 +1,7 @@
 #include "widgets/fieldrule.h"
 
 #include "platform/bytetext.h"
+#include "widgets/fieldtext.h"
 #include "widgets/fieldtip.h"
 
 #include <QLineEdit>
@@ -16,6 +17,7 @@ public:
         : QValidator(field), rule_{rule}, textSet_{field->text()} {}
 
     State validate(QString &input, int &position) const override {
+        refusal_ = rule_.toolTip;
         const QString first = input.left(1);
         if ((!first.isEmpty() && first != textSet_.left(1) && rule_.refusedFirst.contains(first)) ||
             std::ranges::any_of(input, [this](QChar character) {
@@ -23,17 +25,33 @@ public:
             })) {
             return Invalid;
         }
-        cutToFit(input, position);
+        if (rule_.mostBytes > 0) {
+            cutToFit(input, position);
+        }
+        if (isTooLong(input)) {
+            refusal_ = QStringLiteral("At most %1 bytes").arg(mostFieldBytes);
+            return Invalid;
+        }
         return Acceptable;
     }
 
+    /// Why the last text was refused that was.
+    [[nodiscard]] const QString &refusal() const { return refusal_; }
+
 private:
+    /// The bytes are counted only where there may be too many: no character has more than four,
+    /// and those of four count as two.
+    static bool isTooLong(const QString &input) {
+        return 3 * static_cast<std::size_t>(input.size()) > mostFieldBytes &&
+               bytesFromText(input).size() > mostFieldBytes;
+    }
+
     /// What was put in ends at `position`: there it is cut, so that nothing that stood in the field
     /// before is pushed out.
     void cutToFit(QString &input, int &position) const {
         auto excess = static_cast<qsizetype>(bytesFromText(input).size()) - rule_.mostBytes;
         int kept = position;
-        while (rule_.mostBytes > 0 && excess > 0 && kept > 0) {
+        while (excess > 0 && kept > 0) {
             const bool isPair = kept > 1 && input.at(kept - 1).isLowSurrogate() &&
                                 input.at(kept - 2).isHighSurrogate();
             const int length = isPair ? 2 : 1;
@@ -47,7 +65,12 @@ private:
 
     FieldRule rule_;
     QString textSet_;
+    mutable QString refusal_;
 };
+
+void showRefusal(const QLineEdit *field) {
+    showFieldTip(field, static_cast<const RuleValidator *>(field->validator())->refusal());
+}
 
 } // namespace
 
@@ -55,9 +78,15 @@ void applyRule(QLineEdit *field, const FieldRule &rule) {
     if (field->isReadOnly()) {
         return;
     }
-    setFieldTip(field, rule.toolTip);
+    if (!rule.toolTip.isEmpty()) {
+        setFieldTip(field, rule.toolTip);
+    }
+    const bool isFirstRule = field->validator() == nullptr;
+    delete field->validator();
     field->setValidator(new RuleValidator(field, rule));
-    QObject::connect(field, &QLineEdit::inputRejected, field, [field] { showFieldTip(field); });
+    if (isFirstRule) {
+        QObject::connect(field, &QLineEdit::inputRejected, field, [field] { showRefusal(field); });
+    }
 }
 
 void replaceByRule(QLineEdit *field, const QString &text) {
@@ -68,7 +97,7 @@ void replaceByRule(QLineEdit *field, const QString &text) {
     int position = static_cast<int>(text.size());
     if (field->validator() != nullptr &&
         field->validator()->validate(accepted, position) != QValidator::Acceptable) {
-        showFieldTip(field);
+        showRefusal(field);
         return;
     }
     field->setText(accepted);

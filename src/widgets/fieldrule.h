@@ -12,9 +12,10 @@ struct FieldRule {
     QString refusedFirst; ///< Characters that it must not begin with.
     int mostBytes = 0;    ///< Longer input is cut between two characters; 0 for no limit.
     QString toolTip;      ///< Says so; it appears at the field when input is refused.
+                     ///< Every field refuses what would make its text too long; see fieldtext.h.
 };
 
-/// To be called when the field shows its first text.
+/// To be called when the field shows its first text; replaces the rule that it had.
 void applyRule(QLineEdit *field, const FieldRule &rule);
 
 /// Puts a text into the field as if it were pasted over everything; when the rule refuses it, the

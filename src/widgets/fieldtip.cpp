@@ -13,11 +13,10 @@ constexpr int mostBelowPoint = 32;
 /// The tip's frame and margins on both sides together.
 constexpr int tipBorders = 12;
 
-QPoint pointBesideWindow(const QWidget *field) {
+QPoint pointBesideWindow(const QWidget *field, const QString &text) {
     const QRect window = field->window()->frameGeometry();
     const QRect screen = field->screen()->availableGeometry();
-    const QSize tip =
-        QFontMetrics{QToolTip::font()}.size(0, field->toolTip()) + QSize{tipBorders, tipBorders};
+    const QSize tip = QFontMetrics{QToolTip::font()}.size(0, text) + QSize{tipBorders, tipBorders};
     const QPoint at = field->mapToGlobal(QPoint{0, 0});
     if (window.right() + tipBorders + tip.width() <= screen.right()) {
         return {window.right(), at.y() - mostBelowPoint / 2};
@@ -36,7 +35,8 @@ public:
         if (event->type() != QEvent::ToolTip) {
             return QObject::eventFilter(watched, event);
         }
-        showFieldTip(static_cast<QWidget *>(watched));
+        const auto *field = static_cast<QWidget *>(watched);
+        showFieldTip(field, field->toolTip());
         return true;
     }
 };
@@ -50,6 +50,6 @@ void setFieldTip(QWidget *field, const QString &text) {
     field->setToolTip(text);
 }
 
-void showFieldTip(const QWidget *field) {
-    QToolTip::showText(pointBesideWindow(field), field->toolTip());
+void showFieldTip(const QWidget *field, const QString &text) {
+    QToolTip::showText(pointBesideWindow(field, text), text);
 }

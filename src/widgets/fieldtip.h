@@ -10,5 +10,5 @@ class QWidget;
 /// Gives the field a tool tip of its own.
 void setFieldTip(QWidget *field, const QString &text);
 
-/// Shows the field's tool tip now.
-void showFieldTip(const QWidget *field);
+/// Shows a tip for the field now.
+void showFieldTip(const QWidget *field, const QString &text);

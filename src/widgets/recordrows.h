@@ -8,6 +8,7 @@
 #include <functional>
 #include <string>
 #include <string_view>
+#include <type_traits>
 #include <vector>
 
 /// What keeps a list of records and the rows that show them in step. `shown` is a function that
@@ -17,11 +18,13 @@
 
 template <class Record, class Shown>
 void appendRows(QListBox *box, const RecordChain<Record> &records, Shown shown) {
-    std::vector<std::string> texts;
+    static_assert(!std::is_same_v<std::invoke_result_t<Shown, const Record &>, std::string>,
+                  "the views would outlive their texts");
+    std::vector<std::string_view> texts;
     for (const Record &record : records) {
-        texts.emplace_back(shown(record));
+        texts.push_back(shown(record));
     }
-    box->append(std::move(texts));
+    box->append(texts);
 }
 
 /// The link to the record that shows `text`; null when there is no text or no such record.
@@ -45,18 +48,18 @@ Record *recordShown(Record *head, const char *text, Shown shown) {
 /// The text of the current row; null when there is none. Valid until the list changes.
 inline const char *currentText(const QListBox *box) {
     const std::optional<int> row = box->currentRow();
-    return row ? box->text(*row).c_str() : nullptr;
+    return row ? box->text(*row).data() : nullptr;
 }
 
 /// Puts the record at the head of its list and its row at the bottom of the box.
 template <class Record, class Shown>
 void addShown(QListBox *box, Record **head, Record record, Shown shown) {
-    box->append(std::string{shown(prependRecord(head, std::move(record)))});
+    box->append(shown(prependRecord(head, std::move(record))));
 }
 
 inline void changeCurrentRow(QListBox *box, std::string_view text) {
     if (const std::optional<int> row = box->currentRow()) {
-        box->changeText(*row, std::string{text});
+        box->changeText(*row, text);
     }
 }
 

@@ -46,6 +46,9 @@ void SettingsForm::number(const char *caption, int lowest, int highest, NumberSe
 void SettingsForm::text(const char *caption, TextSetting &setting) {
     QLineEdit *field = newTextField(caption, setting.value.value_or(std::string{}));
     stores_.emplace_back([field, &setting] {
+        if (showsPartOnly(field)) {
+            return;
+        }
         const std::string bytes = fieldBytes(field);
         if (setting.value || !bytes.empty()) {
             textSetting(setting.value, bytes);

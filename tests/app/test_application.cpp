@@ -29,7 +29,7 @@ const fs::path rejects = product / "config/reject";
 const fs::path lists = product / "config/lists";
 const fs::path runs = product / "runs"; ///< Has a line for each run of the command.
 
-std::string read(const fs::path &path) { return readWholeFile(path).value_or(""); }
+std::string read(const fs::path &path) { return bytesAt(path.string()); }
 
 /// The bytes of a file among the test's data, with the product's path in it.
 std::string given(const fs::path &name) {
@@ -146,7 +146,7 @@ private slots:
         press(mainDialog(), "Apply");
         QVERIFY(fs::is_directory(aliases) && fs::exists(runs) && mainDialog()->isVisible());
         QVERIFY(read(master).starts_with("| template\n"));
-        QCOMPARE(formatAliases(alias_list) + formatSmtpRejects(smtpreject_list),
+        QCOMPARE(whole(formatAliases, alias_list) + whole(formatSmtpRejects, smtpreject_list),
                  given("applied/alias") + given("applied/reject"));
     }
 

@@ -1,0 +1,59 @@
+#pragma once
+
+#include <cstddef>
+#include <memory>
+#include <string_view>
+
+/// The bytes of a file.
+struct FileBytes {
+    std::unique_ptr<char[]> bytes;
+    std::size_t length = 0;
+
+    // NOLINTNEXTLINE(google-explicit-constructor): to be read like any other text.
+    operator std::string_view() const & { return {bytes.get(), length}; }
+    operator std::string_view() const && = delete; ///< It would see bytes that are gone.
+};
+
+/// A text whose bytes stay where they are until the process ends, so that records, their copies and
+/// whatever shows them hold views of one text instead of texts of their own. Only `keep` makes one
+/// that is not empty, and parts of one are such again: it cannot dangle.
+///
+/// The price: the bytes of a text that is replaced or removed stay, too, and so do those of a data
+/// file that no record took. They are few beside what is in use: a user typed them, or they are
+/// comments and keys.
+class KeptText {
+public:
+    constexpr KeptText() = default;
+
+    // NOLINTNEXTLINE(google-explicit-constructor): to be read like any other text.
+    constexpr operator std::string_view() const { return bytes_; }
+
+    [[nodiscard]] bool empty() const { return bytes_.empty(); }
+    [[nodiscard]] std::size_t size() const { return bytes_.size(); }
+    [[nodiscard]] const char *data() const { return bytes_.data(); }
+    [[nodiscard]] char front() const { return bytes_.front(); }
+    [[nodiscard]] bool starts_with(char first) const { return bytes_.starts_with(first); }
+    [[nodiscard]] bool starts_with(std::string_view first) const {
+        return bytes_.starts_with(first);
+    }
+
+    /// As of a string view, but beyond the end it gives an empty text.
+    [[nodiscard]] KeptText substr(std::size_t from,
+                                  std::size_t length = std::string_view::npos) const {
+        return KeptText{bytes_.substr(from < bytes_.size() ? from : bytes_.size(), length)};
+    }
+    void remove_prefix(std::size_t length) { bytes_.remove_prefix(length); }
+
+private:
+    explicit constexpr KeptText(std::string_view bytes) : bytes_{bytes} {}
+    friend KeptText keep(std::string_view text);
+    friend KeptText keep(FileBytes file);
+
+    std::string_view bytes_;
+};
+
+/// Copies the text to where it stays. Throws std::bad_alloc.
+KeptText keep(std::string_view text);
+
+/// Takes over the file's bytes. Throws std::bad_alloc.
+KeptText keep(FileBytes file);
