@@ -37,10 +37,9 @@ public:
         return bytes_.starts_with(first);
     }
 
-    /// As of a string view, but beyond the end it gives an empty text.
     [[nodiscard]] KeptText substr(std::size_t from,
                                   std::size_t length = std::string_view::npos) const {
-        return KeptText{bytes_.substr(from < bytes_.size() ? from : bytes_.size(), length)};
+        return KeptText{bytes_.substr(from, length)};
     }
     void remove_prefix(std::size_t length) { bytes_.remove_prefix(length); }
 
