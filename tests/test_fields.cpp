@@ -7,6 +7,7 @@
 #include "datafiles.h"
 #include "dialogdriver.h"
 
+#include <QToolTip>
 #include <QWheelEvent>
 
 #include <limits>
@@ -66,6 +67,7 @@ private slots:
                 });
             },
             "[pasting into a field]");
+        QCOMPARE(QToolTip::text(), "At most 100000 bytes");
         for (const char *caption : {"&Server:", "&Username:", "&Password:"}) {
             std::optional<EditFetch> dialog;
             const auto inDialog = [&](KeptText stored) {

@@ -230,9 +230,11 @@ private slots:
         QTemporaryFile file;
         QVERIFY(file.open() && file.write("c@x\nno address\n:\xff@x\n") > 0 && file.flush());
         const QStringList titles{"List Members", "Allowed Posters", "Blocked Posters"};
+        const QStringList rows{"ann", ":al", ":bl"}; // Only a member is shown without its colon.
         for (const QString &title : titles) {
-            withEditor("ann\n", [&](QWidget *editor) {
+            withEditor(":ann\n", [&](QWidget *editor) {
                 const QGroupBox *group = captioned(editor, &QGroupBox::title, title);
+                QCOMPARE(rowsOf(boxIn(group)), rows.at(titles.indexOf(title)));
                 act(group, "Load File", "&Filename:", file.fileName());
                 act(group, "Search...", "&Search for:", "c@");
                 act(group, "Modify...", "&Email:", "new");
@@ -242,7 +244,7 @@ private slots:
                 press(group, "Remove");
             });
             const maillist_entry &list = *maillist_list.head;
-            QStringList after{"ann", ":al", "bl"};
+            QStringList after{":ann", ":al", ":bl"};
             after[titles.indexOf(title)].prepend(textFromBytes(":\xff@x|new|"));
             QCOMPARE((QStringList{joined(list.member), joined(list.allow), joined(list.block)}),
                      after);

@@ -11,7 +11,7 @@
 namespace {
 
 /// A list in a dialog with a default button.
-struct Window {
+struct Window : QObject {
     explicit Window(int current,
                     const std::vector<std::string_view> &rows = {"a", "b", "c", "d", "e"}) {
         box->resize(200, 300);
@@ -24,6 +24,11 @@ struct Window {
         if (current >= 0) {
             box->setCurrentRow(current);
         }
+    }
+
+    bool eventFilter(QObject *watched, QEvent *event) override {
+        isPainted = isPainted || event->type() == QEvent::Paint;
+        return QObject::eventFilter(watched, event);
     }
 
     /// The row that buttons act on, or -1; several when another one is highlighted or focused.
@@ -42,6 +47,7 @@ struct Window {
     QPushButton *ok = new QPushButton("OK", &dialog);
     QListBox *box = new QListBox(&dialog);
     std::vector<std::string> selected;
+    bool isPainted = false;
 };
 
 } // namespace
@@ -88,6 +94,16 @@ private slots:
         window.box->append("new");
         QVERIFY(window.box->viewport()->rect().contains(centreOfRow(window.box, 100)));
         QCOMPARE(window.current(), "0");
+    }
+
+    void changedTextIsPainted() {
+        Window window{-1};
+        QVERIFY(QTest::qWaitForWindowExposed(&window.dialog));
+        QCoreApplication::processEvents();
+        window.box->viewport()->installEventFilter(&window);
+        window.isPainted = false;
+        window.box->changeText(2, "changed");
+        QTRY_VERIFY(window.isPainted);
     }
 
     void onlyALongRowHasAToolTip() {

@@ -32,6 +32,13 @@ class TestServerPages : public QObject {
     Q_OBJECT
 
 private slots:
+    void textTooLongToBeEditedIsKept() {
+        settingByKey("mail.domains", std::string(100'001, 'x'));
+        const auto values = allValues();
+        newPage<MailDebatch>()->storeValues();
+        QVERIFY(allValues() == values);
+    }
+
     /// What the fields would not take from the user, or could make something else of, stays.
     void oneEditChangesItsSetting() {
         settingByKey("smtp.sock.port", "70000");

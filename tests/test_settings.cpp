@@ -55,6 +55,13 @@ private slots:
         }
     }
 
+    void ofTwoKeysThatDifferInCaseTheFirstCounts() {
+        SettingTable table;
+        const TextSetting first{table, "a.Key"};
+        const TextSetting second{table, "A.key"};
+        QVERIFY(table.find("a.key") == &first && table.find("A.KEY") == &first);
+    }
+
     void everyKeyInCapitalsReachesItsSetting() {
         for (Setting *setting : settings().all()) {
             const std::string before = shown(setting);
