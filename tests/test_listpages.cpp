@@ -203,6 +203,19 @@ private slots:
         QCOMPARE(maillist_list.head->flags, 2U + 4U + 8U + 16U + 32U);
     }
 
+    void emptyMemberOnTheDigestCanBeChanged() {
+        withEditor("", [](QWidget *editor) {
+            const auto empty = [](QWidget *dialog) {
+                press(dialog, "Digest List");
+                press(dialog, "OK");
+            };
+            QVERIFY(withDialog([&] { press(editor, "Add..."); }, empty));
+            withFirst(editor, answer("&Email:", "ann"));
+            QCOMPARE(rowsOf(boxIn(editor)), "ann");
+        });
+        QCOMPARE(joined(maillist_list.head->member), ":ann");
+    }
+
     void membersOnTheDigest() {
         using Case = std::tuple<const char *, bool, const char *, const char *>;
         for (const auto &[members, isDigestPressed, closing, after] :

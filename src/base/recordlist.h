@@ -29,8 +29,7 @@ public:
     static void free(Record *record) {
         if constexpr (recordsInBlocks) {
             record->~Record();
-            auto *place = reinterpret_cast<Place *>(record);
-            place->next = std::exchange(free_, place);
+            free_ = new (record) Place{free_};
         } else {
             delete record;
         }

@@ -61,31 +61,24 @@ private:
     void (*pipe_)(int);
 };
 
-/// Measures what a format puts.
-class CountingSink : public ByteSink {
-public:
-    [[nodiscard]] std::size_t count() const { return count_; }
-
-protected:
-    void take(std::string_view bytes) override { count_ += bytes.size(); }
-
-private:
-    std::size_t count_ = 0;
-};
-
+/// Counts the bytes, and writes them once there is a file for them.
 class FileSink : public ByteSink {
 public:
-    explicit FileSink(int file) : file_{file} {}
+    /// How many bytes there were since the beginning, or since there is a file.
+    [[nodiscard]] std::size_t count() const { return count_; }
+    void writeTo(int file) {
+        file_ = file;
+        count_ = 0;
+    }
     [[nodiscard]] bool isWhole() const { return isWhole_; }
-    [[nodiscard]] std::size_t written() const { return written_; }
 
 protected:
     void take(std::string_view bytes) override {
-        while (isWhole_ && !bytes.empty()) {
+        count_ += bytes.size();
+        while (file_ >= 0 && isWhole_ && !bytes.empty()) {
             const ssize_t count = ::write(file_, bytes.data(), bytes.size());
             if (count > 0) {
                 bytes.remove_prefix(static_cast<std::size_t>(count));
-                written_ += static_cast<std::size_t>(count);
             } else {
                 isWhole_ = count < 0 && errno == EINTR;
             }
@@ -93,9 +86,9 @@ protected:
     }
 
 private:
-    int file_;
+    int file_ = -1;
+    std::size_t count_ = 0;
     bool isWhole_ = true;
-    std::size_t written_ = 0;
 };
 
 /// Whether the file system says that it has room for `size` bytes more; some say nothing.
@@ -105,8 +98,16 @@ bool hasFreeSpace(int file, std::size_t size) {
            system.f_bavail * system.f_frsize >= size;
 }
 
+/// Gives back what room the file has behind its end.
+void giveRoomBack(int file) {
+    struct stat status {};
+    if (::fstat(file, &status) == 0) {
+        [[maybe_unused]] const int result = ::ftruncate(file, status.st_size);
+    }
+}
+
 /// Has room for `size` bytes set aside for the file; where the file system cannot do that, asks
-/// whether there is as much. False when there is none: what was had of it by then is given back.
+/// whether there is as much. False when there is none.
 bool takeRoom(int file, const struct stat &status, std::size_t size) {
     rlimit limit{};
     if (::getrlimit(RLIMIT_FSIZE, &limit) == 0 && limit.rlim_cur < size) {
@@ -116,10 +117,12 @@ bool takeRoom(int file, const struct stat &status, std::size_t size) {
         return true;
     }
     if (errno != ENOSPC && errno != EDQUOT && errno != EFBIG) {
-        const std::size_t had = static_cast<std::size_t>(status.st_blocks) * 512;
-        return size <= had || hasFreeSpace(file, size - had);
+        // What a file with holes has may lie behind them.
+        const off_t had = status.st_blocks * 512;
+        const auto usable = static_cast<std::size_t>(had < status.st_size ? 0 : had);
+        return size <= usable || hasFreeSpace(file, size - usable);
     }
-    [[maybe_unused]] const int result = ::ftruncate(file, status.st_size);
+    giveRoomBack(file); // A call that fails keeps what it got by then.
     return false;
 }
 
@@ -158,25 +161,28 @@ std::optional<FileBytes> readWholeFile(const std::string &path) {
 }
 
 bool rewriteFile(const std::string &path, const std::function<void(ByteSink &)> &format) {
-    CountingSink measure;
-    format(measure);
-    measure.flush();
+    FileSink sink;
+    format(sink);
+    sink.flush();
     const FileDescriptor file{path, O_WRONLY | O_CREAT};
     struct stat status {};
     if (!file.isOpen() || ::fstat(file.number(), &status) != 0) {
         return false;
     }
-    FileSink sink{file.number()};
     const bool isRegular = S_ISREG(status.st_mode);
-    if (isRegular && !takeRoom(file.number(), status, measure.count())) {
+    if (isRegular && !takeRoom(file.number(), status, sink.count())) {
         return false;
     }
     const WriteSignalsIgnored ignored;
+    sink.writeTo(file.number());
     format(sink);
     sink.flush();
+    if (!sink.isWhole()) {
+        giveRoomBack(file.number());
+        return false;
+    }
     // Only now, and only behind what was written: to cut it first would give the room away again.
-    const auto end = static_cast<off_t>(sink.written());
-    return (!isRegular || ::ftruncate(file.number(), end) == 0) && sink.isWhole();
+    return !isRegular || ::ftruncate(file.number(), static_cast<off_t>(sink.count())) == 0;
 }
 
 bool rewriteFile(const std::string &path, std::string_view bytes) {

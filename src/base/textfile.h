@@ -25,8 +25,9 @@ std::optional<FileBytes> readWholeFile(const std::string &path);
 ///
 /// `format` is called twice and must put the same both times: first to measure, so that room for
 /// all of it is had before the first old byte is touched. Where there is no room, or memory runs
-/// out while it is measured (std::bad_alloc is passed on), the file keeps what it holds. The second
-/// time it must not throw; what takes memory belongs into the first, or before both.
+/// out while it is measured (std::bad_alloc is passed on), the file keeps what it holds; one that
+/// was missing may be left empty. The second time it must not throw; what takes memory belongs into
+/// the first, or before both. A device that fails on the way leaves new bytes before old ones.
 bool rewriteFile(const std::string &path, const std::function<void(ByteSink &)> &format);
 bool rewriteFile(const std::string &path, std::string_view bytes);
 

@@ -34,6 +34,6 @@ KeptText EditListMember::addr(const maillist_addr_entry &before) const {
     if (!digest_->isChecked()) {
         return address;
     }
-    const bool isUnchanged = isOnDigest(before) && address.data() == addressShown(before).data();
-    return isUnchanged ? before.addr : keep(':' + std::string{address});
+    const std::string stored = ':' + std::string{address};
+    return stored == std::string_view{before.addr} ? before.addr : keep(stored);
 }

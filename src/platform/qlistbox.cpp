@@ -53,7 +53,7 @@ public:
     }
 
     void reserve(const std::vector<std::string_view> &texts) {
-        std::size_t length = texts_.size() + texts.size();
+        std::size_t length = texts_.size() + texts.size(); // Each with its NUL.
         for (const std::string_view text : texts) {
             length += text.size();
         }
@@ -102,11 +102,12 @@ private:
     Row placed(std::string_view text) {
         makeRoom(texts_, texts_.size() + text.size() + 1);
         const Row row{texts_.size(), text.size()};
-        texts_.append(text).push_back('\0');
+        texts_.insert(texts_.end(), text.begin(), text.end());
+        texts_.push_back('\0');
         return row;
     }
 
-    std::string texts_;
+    std::vector<char> texts_;
     std::vector<Row> rows_;
 };
 
