@@ -132,7 +132,16 @@ std::string continuations(int count) {
     return lines("%mail.domains: a\n", "\tdomain%07d.example.com\n", count);
 }
 
-std::string keyLines(int count) { return lines("", "%%smtp.sock.port: %07d\n", count); }
+/// All keys in turns, so that none is found sooner than on average.
+std::string keyLines(int count) {
+    const std::vector<Setting *> &all = settings().all();
+    std::string bytes;
+    for (int line = 0; line < count; ++line) {
+        const char *key = all.at(static_cast<std::size_t>(line) % all.size())->key();
+        bytes += '%' + std::string{key} + numbered(": %07d\n", line);
+    }
+    return bytes;
+}
 
 std::string masterPath() { return productPaths().master; }
 

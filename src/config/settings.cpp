@@ -1,20 +1,25 @@
 #include "config/settings.h"
 
-#include <cstring>
+namespace {
+
+/// What equal keys have in common whatever the locale holds for one letter in two cases: their
+/// length, and where the dots are.
+std::size_t shapeOf(std::string_view key) {
+    const auto place = [](std::size_t dot) { return (dot + 1) & 0xff; };
+    return (key.size() << 16) + (place(key.find('.')) << 8) + place(key.rfind('.'));
+}
+
+} // namespace
 
 Setting::Setting(SettingTable &table, const char *key) : key_{key} {
-    const std::size_t length = std::strlen(key);
-    if (table.byLength_.size() <= length) {
-        table.byLength_.resize(length + 1);
-    }
-    table.byLength_[length].push_back(this);
+    table.byShape_[shapeOf(key)].push_back(this);
     table.all_.push_back(this);
 }
 
 Setting *SettingTable::find(const std::string &key) const {
-    const std::size_t length = std::strlen(key.c_str());
-    if (length < byLength_.size()) {
-        for (Setting *setting : byLength_[length]) {
+    const auto sameShape = byShape_.find(shapeOf(key.c_str()));
+    if (sameShape != byShape_.end()) {
+        for (Setting *setting : sameShape->second) {
             if (compareNoCase(key.c_str(), setting->key()) == 0) {
                 return setting;
             }

@@ -4,6 +4,7 @@
 
 #include <string>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 /// One key of the master file with its value.
@@ -41,9 +42,7 @@ public:
 private:
     friend class Setting;
     std::vector<Setting *> all_;
-    /// The same by the length of their keys: whatever the locale holds for one letter in two
-    /// cases, equal keys are equally long.
-    std::vector<std::vector<Setting *>> byLength_;
+    std::unordered_map<std::size_t, std::vector<Setting *>> byShape_;
 };
 
 /// What one unit in the file stands for in the store.

@@ -111,10 +111,12 @@ int compareNoCase(const char *a, const char *b) {
         return -1;
     }
     for (;; ++a, ++b) {
-        const int lowerA = std::tolower(static_cast<unsigned char>(*a));
-        const int lowerB = std::tolower(static_cast<unsigned char>(*b));
-        if (lowerA != lowerB) {
-            return lowerA < lowerB ? -1 : 1;
+        if (*a != *b) { // The library is asked where it matters only: keys mostly are as here.
+            const int lowerA = std::tolower(static_cast<unsigned char>(*a));
+            const int lowerB = std::tolower(static_cast<unsigned char>(*b));
+            if (lowerA != lowerB) {
+                return lowerA < lowerB ? -1 : 1;
+            }
         }
         if (*a == '\0') {
             return 0;
