@@ -1,5 +1,7 @@
 #pragma once
 
+#include "base/largepages.h"
+
 #include <cstddef>
 #include <new>
 #include <utility>
@@ -40,15 +42,19 @@ private:
         Place *next;
         alignas(Record) std::byte record[sizeof(Record)];
     };
-    static constexpr std::size_t placesInABlock = 512;
+    /// Blocks grow with what they are needed for.
+    static constexpr std::size_t fewestPlaces = 512;
+    static constexpr std::size_t mostPlaces = 8 * largePageSize / sizeof(Place);
 
     static void *takePlace() {
         if (free_ != nullptr) {
             return std::exchange(free_, free_->next);
         }
         if (fresh_ == freshEnd_) {
-            fresh_ = new Place[placesInABlock];
-            freshEnd_ = fresh_ + placesInABlock;
+            fresh_ = new Place[nextPlaces_];
+            freshEnd_ = fresh_ + nextPlaces_;
+            adviseLargePages(fresh_, nextPlaces_ * sizeof(Place));
+            nextPlaces_ = 2 * nextPlaces_ < mostPlaces ? 2 * nextPlaces_ : mostPlaces;
         }
         return fresh_++;
     }
@@ -56,6 +62,7 @@ private:
     static inline Place *free_ = nullptr;  ///< Places that a record has left.
     static inline Place *fresh_ = nullptr; ///< This and the next: what no record has had yet.
     static inline Place *freshEnd_ = nullptr;
+    static inline std::size_t nextPlaces_ = fewestPlaces;
 };
 
 /// Singly linked records, reached through a head pointer: the only code that makes, links, unlinks

@@ -1,5 +1,7 @@
 #include "base/textfile.h"
 
+#include "base/largepages.h"
+
 #include <cerrno>
 #include <csignal>
 #include <fcntl.h>
@@ -138,6 +140,7 @@ std::optional<FileBytes> readWholeFile(const std::string &path) {
     // nothing of its size, or grows meanwhile, is read to its end all the same.
     std::size_t size = static_cast<std::size_t>(status.st_size) + 1;
     FileBytes read{std::unique_ptr<char[]>{new char[size]}};
+    adviseLargePages(read.bytes.get(), size);
     for (;;) {
         const ssize_t count =
             ::read(file.number(), read.bytes.get() + read.length, size - read.length);

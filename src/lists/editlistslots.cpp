@@ -19,21 +19,6 @@
 
 namespace {
 
-/// The row after the current one, from the top again behind the last, that holds the needle. The
-/// current row itself is not looked at.
-std::optional<int> nextRowHolding(const QListBox *box, const std::string &needle) {
-    const int count = box->count();
-    const std::optional<int> current = box->currentRow();
-    const int tested = current ? count - 1 : count;
-    for (int step = 0; step < tested; ++step) {
-        const int row = (current.value_or(-1) + 1 + step) % count;
-        if (box->text(row).find(needle) != std::string_view::npos) {
-            return row;
-        }
-    }
-    return std::nullopt;
-}
-
 void showUnreadable(QWidget *editor) {
     QMessageBox message{
         QMessageBox::Information, QStringLiteral("Mailling List Manager"),

@@ -1,5 +1,6 @@
 #include "platform/qlistbox.h"
 
+#include "base/largepages.h"
 #include "platform/bytetext.h"
 
 #include <QAbstractListModel>
@@ -96,6 +97,8 @@ private:
     static void makeRoom(Container &container, std::size_t size) {
         if (size > container.capacity()) {
             container.reserve(size + size / 8);
+            adviseLargePages(container.data(),
+                             container.capacity() * sizeof(typename Container::value_type));
         }
     }
 
