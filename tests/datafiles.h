@@ -58,8 +58,8 @@ inline std::string operator+(std::string before, const KeptText &text) {
 
 /// The bytes of a file; "none" where it cannot be read.
 inline std::string bytesAt(const std::string &path) {
-    const std::optional<FileBytes> file = readWholeFile(path);
-    return file ? std::string{std::string_view{*file}} : "none";
+    const FileRead file = readWholeFile(path);
+    return file.bytes ? std::string{std::string_view{*file.bytes}} : "none";
 }
 
 /// What a format puts of a list.

@@ -1,12 +1,15 @@
 #include "alias/aliasfile.h"
 
-#include "config/datafile.h"
+#include "base/textfile.h"
+#include "config/settings.h"
 
 #include <cctype>
 
 RecordChain<alias_entry> alias_list;
 
 namespace {
+
+ProductFile aliasFile;
 
 constexpr ByteSet skippedBeginnings{"|# \r\n\t"};
 constexpr ByteSet wordEnds{"\t ,"};
@@ -88,19 +91,12 @@ void formatAliases(const RecordChain<alias_entry> &list, ByteSink &sink) {
 }
 
 int readAliasFile() {
-    try {
-        const std::optional<KeptText> bytes = readDataFile(settings().mail_file_alias);
-        if (!bytes) {
-            return 1;
-        }
-        parseAliases(*bytes, alias_list);
-    } catch (const std::bad_alloc &) {
-        return 2;
-    }
-    return 0;
+    return aliasFile.read(settings().mail_file_alias.value, [](FileBytes bytes) {
+        parseAliases(keep(std::move(bytes)), alias_list);
+    });
 }
 
 void writeAliasFile() {
-    rewriteDataFile(settings().mail_file_alias,
-                    [](ByteSink &sink) { formatAliases(alias_list, sink); });
+    aliasFile.rewrite(settings().mail_file_alias.value,
+                      [](ByteSink &sink) { formatAliases(alias_list, sink); });
 }

@@ -14,8 +14,8 @@ namespace {
 
 class FileDescriptor {
 public:
-    FileDescriptor(const std::string &path, int flags)
-        : number_{opened(path.c_str(), flags | O_CLOEXEC | O_NOCTTY)} {}
+    FileDescriptor(const std::string &path, int flags, mode_t newFileMode = 0)
+        : number_{opened(path.c_str(), flags | O_CLOEXEC | O_NOCTTY, newFileMode)} {}
     FileDescriptor(const FileDescriptor &) = delete;
     FileDescriptor &operator=(const FileDescriptor &) = delete;
     ~FileDescriptor() {
@@ -28,15 +28,15 @@ public:
     [[nodiscard]] int number() const { return number_; }
 
 private:
-    static int opened(const char *path, int flags) {
+    static int opened(const char *path, int flags, mode_t newFileMode) {
         // A pipe must not make the program wait for its other end. A regular file that someone
         // holds a lease on would fail here as well; it is worth the wait until the lease is given
         // up.
-        const int number = ::open(path, flags | O_NONBLOCK, 0666);
+        const int number = ::open(path, flags | O_NONBLOCK, newFileMode);
         struct stat status {};
         if (number < 0 && errno == EWOULDBLOCK && ::stat(path, &status) == 0 &&
             S_ISREG(status.st_mode)) {
-            return ::open(path, flags, 0666);
+            return ::open(path, flags, newFileMode);
         }
         return number;
     }
@@ -115,7 +115,14 @@ bool takeRoom(int file, const struct stat &status, std::size_t size) {
     if (::getrlimit(RLIMIT_FSIZE, &limit) == 0 && limit.rlim_cur < size) {
         return false;
     }
-    if (size == 0 || ::fallocate(file, FALLOC_FL_KEEP_SIZE, 0, static_cast<off_t>(size)) == 0) {
+    if (size == 0) {
+        return true;
+    }
+    int result = 0;
+    do {
+        result = ::fallocate(file, FALLOC_FL_KEEP_SIZE, 0, static_cast<off_t>(size));
+    } while (result != 0 && errno == EINTR);
+    if (result == 0) {
         return true;
     }
     if (errno != ENOSPC && errno != EDQUOT && errno != EFBIG) {
@@ -130,11 +137,14 @@ bool takeRoom(int file, const struct stat &status, std::size_t size) {
 
 } // namespace
 
-std::optional<FileBytes> readWholeFile(const std::string &path) {
+FileRead readWholeFile(const std::string &path) {
     const FileDescriptor file{path, O_RDONLY};
+    if (!file.isOpen()) {
+        return {std::nullopt, errno == ENOENT};
+    }
     struct stat status {};
-    if (!file.isOpen() || ::fstat(file.number(), &status) != 0 || !S_ISREG(status.st_mode)) {
-        return std::nullopt;
+    if (::fstat(file.number(), &status) != 0 || !S_ISREG(status.st_mode)) {
+        return {};
     }
     // One byte more than the size, so that the end is found without growing; a file that says
     // nothing of its size, or grows meanwhile, is read to its end all the same.
@@ -148,10 +158,10 @@ std::optional<FileBytes> readWholeFile(const std::string &path) {
             continue;
         }
         if (count < 0) {
-            return std::nullopt;
+            return {};
         }
         if (count == 0) {
-            return read;
+            return {std::move(read)};
         }
         read.length += static_cast<std::size_t>(count);
         if (read.length == size) {
@@ -163,11 +173,12 @@ std::optional<FileBytes> readWholeFile(const std::string &path) {
     }
 }
 
-bool rewriteFile(const std::string &path, const std::function<void(ByteSink &)> &format) {
+bool rewriteFile(const std::string &path, const std::function<void(ByteSink &)> &format,
+                 mode_t newFileMode) {
     FileSink sink;
     format(sink);
     sink.flush();
-    const FileDescriptor file{path, O_WRONLY | O_CREAT};
+    const FileDescriptor file{path, O_WRONLY | O_CREAT, newFileMode};
     struct stat status {};
     if (!file.isOpen() || ::fstat(file.number(), &status) != 0) {
         return false;
@@ -185,11 +196,24 @@ bool rewriteFile(const std::string &path, const std::function<void(ByteSink &)> 
         return false;
     }
     // Only now, and only behind what was written: to cut it first would give the room away again.
-    return !isRegular || ::ftruncate(file.number(), static_cast<off_t>(sink.count())) == 0;
+    const bool isCut =
+        !isRegular || ::ftruncate(file.number(), static_cast<off_t>(sink.count())) == 0;
+    // Before the next file is touched. What is no file, or on no disk, cannot, and need not.
+    return (::fdatasync(file.number()) == 0 || errno == EINVAL || errno == EROFS) && isCut;
 }
 
 bool rewriteFile(const std::string &path, std::string_view bytes) {
     return rewriteFile(path, [bytes](ByteSink &sink) { sink.put(bytes); });
+}
+
+void ProductFile::rewrite(const Path &path, const std::function<void(ByteSink &)> &format,
+                          mode_t newFileMode) const {
+    try {
+        if (path && isWhole_) {
+            rewriteFile(*path, format, newFileMode);
+        }
+    } catch (const std::bad_alloc &) { // Like every failed write: nothing is reported.
+    }
 }
 
 bool mayRewrite(const std::string &path) {

@@ -9,6 +9,11 @@
 
 namespace {
 
+ProductFile masterFile;
+
+/// It holds passwords.
+constexpr mode_t newFileMode = 0640;
+
 constexpr char commentMark = '|';
 constexpr char keyMark = '%';
 constexpr ByteSet blanks{" \t"};
@@ -47,7 +52,7 @@ private:
 
 /// A template's key line with the store's value, or as it is.
 MasterLine keyLine(std::string_view line) {
-    const std::size_t colon = line.find(':');
+    const std::size_t colon = beforeNul(line).find(':');
     if (colon != std::string_view::npos) {
         if (auto value = settingByKey(std::string{line.substr(1, colon - 1)}, std::nullopt)) {
             return {line.substr(0, colon), std::move(value)};
@@ -112,28 +117,23 @@ void formatMasterConfig(const std::vector<MasterLine> &lines, ByteSink &sink) {
 
 int readMasterConfig() {
     const char *path = productPaths().master;
-    std::optional<FileBytes> bytes;
-    try {
-        bytes = readWholeFile(path);
-        if (bytes) {
-            parseMasterConfig(*bytes);
-        }
-    } catch (const std::bad_alloc &) { // What the store was given until here stays.
-    }
-    if (!bytes) {
+    const int result =
+        masterFile.read(path, [](const FileBytes &bytes) { parseMasterConfig(bytes); });
+    if (result == 1) {
         std::printf("Couldn't open config file:%s\n", path);
         std::fflush(stdout);
-        return 1;
     }
-    return 0;
+    return result;
 }
 
 void writeMasterConfig() {
     try {
-        if (const auto masterTemplate = readWholeFile(productPaths().masterTemplate)) {
-            const std::vector<MasterLine> lines = masterLines(*masterTemplate);
-            rewriteFile(productPaths().master,
-                        [&lines](ByteSink &sink) { formatMasterConfig(lines, sink); });
+        const FileRead masterTemplate = readWholeFile(productPaths().masterTemplate);
+        if (masterTemplate.bytes) {
+            const std::vector<MasterLine> lines = masterLines(*masterTemplate.bytes);
+            masterFile.rewrite(
+                productPaths().master,
+                [&lines](ByteSink &sink) { formatMasterConfig(lines, sink); }, newFileMode);
         }
     } catch (const std::bad_alloc &) { // Like every failed write: nothing is reported.
     }

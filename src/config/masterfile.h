@@ -32,8 +32,10 @@ struct MasterLine {
 std::vector<MasterLine> masterLines(std::string_view masterTemplate);
 void formatMasterConfig(const std::vector<MasterLine> &lines, ByteSink &sink);
 
-/// Fills the store. 0, or 1 after a line on standard output when the file cannot be opened.
+/// Fills the store. 0; 1 after a line on standard output when the file cannot be opened; 2 when
+/// memory ran out.
 int readMasterConfig();
 
-/// Rewrites the master file from the template; leaves it alone when there is no template.
+/// Rewrites the master file from the template; leaves it alone when there is no template, or when
+/// it was there and could not be read whole.
 void writeMasterConfig();

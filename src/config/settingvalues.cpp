@@ -64,6 +64,7 @@ std::optional<std::string> textSetting(std::optional<std::string> &field, TextOr
         field = std::string{*text};
     } catch (const std::bad_alloc &) {
         field.reset();
+        throw;
     }
     return std::nullopt;
 }
@@ -98,11 +99,7 @@ std::optional<std::string> accessListSetting(std::optional<AccessList> &field, T
         return field ? formatAccessList(*field) : std::string{};
     }
     field.reset();
-    try {
-        field = parseAccessList(*text);
-    } catch (const std::bad_alloc &) {
-        field.reset();
-    }
+    field = parseAccessList(*text);
     return std::nullopt;
 }
 

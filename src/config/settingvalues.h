@@ -9,10 +9,11 @@
 
 /// The five types of setting and their texts. Each handler works both ways: given a text it parses
 /// it into the field and returns none; given none it leaves the field alone and returns its text.
+/// Out of memory (std::bad_alloc) leaves the field absent where there was a text to parse.
 
 using TextOrNone = std::optional<std::string_view>;
 
-/// An absent text renders as none. Out of memory leaves the field absent.
+/// An absent text renders as none.
 std::optional<std::string> textSetting(std::optional<std::string> &field, TextOrNone text);
 
 /// Decimal. The field holds the number read times `scale` (a scale below 1 counts as 1), both
@@ -25,7 +26,7 @@ std::optional<std::string> boolSetting(std::int32_t &field, TextOrNone text);
 /// "%2d:%2d"; the field holds hour * 256 + minute. Hours and minutes are bytes, not checked.
 std::optional<std::string> timeSetting(std::int32_t &field, TextOrNone text);
 
-/// An absent list renders as an empty text. Out of memory leaves the field absent.
+/// An absent list renders as an empty text.
 std::optional<std::string> accessListSetting(std::optional<AccessList> &field, TextOrNone text);
 
 /// -1, 0 or 1, as the strings compare once the C library has lower-cased every byte; -1 when either

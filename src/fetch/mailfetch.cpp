@@ -44,7 +44,9 @@ void MailFetch::loadValues() {}
 
 void MailFetch::storeValues() {
     settings().pop_time.value = pollTime_->getValue();
-    textSetting(settings().pop_hosts.value, formatPopHosts());
+    if (popHostsAreWhole()) {
+        textSetting(settings().pop_hosts.value, formatPopHosts());
+    }
 }
 
 void MailFetch::MailFetchAdd() {

@@ -9,6 +9,8 @@ RecordChain<pop_host> pop_host_list;
 
 namespace {
 
+bool areWhole = true;
+
 constexpr ByteSet separators{":@,\r\n"};
 constexpr ByteSet betweenEntries{",\r\n"};
 
@@ -54,6 +56,7 @@ bool takeEntry(std::string_view &text, pop_host &host) {
 
 void parsePopHosts(TextOrNone text) {
     pop_host_list.clear();
+    areWhole = true;
     std::string_view rest = text.value_or(std::string_view{});
     RecordAppender<pop_host> end{&pop_host_list.head};
     try {
@@ -67,9 +70,12 @@ void parsePopHosts(TextOrNone text) {
                 end.append(host);
             }
         }
-    } catch (const std::bad_alloc &) { // The records made so far stay.
+    } catch (const std::bad_alloc &) {
+        areWhole = false;
     }
 }
+
+bool popHostsAreWhole() { return areWhole; }
 
 std::string formatPopHosts() {
     std::string text;

@@ -46,5 +46,9 @@ void setPopHostText(std::array<char, size> &field, std::string_view text) {
 /// star flag. Out of memory keeps the records made so far.
 void parsePopHosts(TextOrNone text);
 
+/// Whether memory sufficed for all of the text that was parsed last. Otherwise pop_host_list must
+/// not take the text's place.
+bool popHostsAreWhole();
+
 /// pop_host_list with a line feed behind each entry.
 std::string formatPopHosts();

@@ -73,12 +73,12 @@ void EditList::Load(QListBox *box, maillist_addr_entry **chain) {
         return;
     }
     try {
-        const std::optional<FileBytes> file = readWholeFile(dialog.fileName());
-        if (!file) {
+        const FileRead file = readWholeFile(dialog.fileName());
+        if (!file.bytes) {
             showUnreadable(this);
             return;
         }
-        AddressChain loaded = parseAddressLines(*file);
+        AddressChain loaded = parseAddressLines(*file.bytes);
         std::vector<std::string_view> rows;
         for (const maillist_addr_entry &address : loaded) {
             rows.push_back(address.addr);

@@ -1,12 +1,17 @@
 #include "lists/maillistfile.h"
 
-#include "config/datafile.h"
+#include "base/textfile.h"
+#include "config/settings.h"
+#include "config/settingvalues.h"
 
+#include <algorithm>
 #include <array>
 
 RecordChain<maillist_entry> maillist_list;
 
 namespace {
+
+ProductFile mailListFile;
 
 constexpr std::size_t longestPiece = 249;
 constexpr std::size_t longestLoadedPiece = 254;
@@ -126,7 +131,7 @@ void putLine(ByteSink &sink, std::string_view key, std::string_view value = {}) 
 void putSection(ByteSink &sink, std::string_view name, const AddressChain &addresses) {
     putLine(sink, "#start ", name);
     for (const maillist_addr_entry &address : addresses) {
-        if (!address.addr.starts_with('#')) {
+        if (!address.addr.starts_with('#') && address.addr.size() <= longestPiece) {
             putLine(sink, address.addr);
         }
     }
@@ -175,17 +180,19 @@ AddressChain parseAddressLines(std::string_view bytes) {
     return addresses;
 }
 
+std::size_t mostBytesOf(KeptText maillist_entry::*field) {
+    const auto found = std::ranges::find(textKeys, field, &TextKey::field);
+    return longestTyped - found->key.size();
+}
+
 void readMailListFile() {
     maillist_list.clear();
-    try {
-        if (const auto bytes = readDataFile(settings().mail_file_maillist)) {
-            parseMailLists(*bytes, maillist_list);
-        }
-    } catch (const std::bad_alloc &) { // The records made until here stay.
-    }
+    mailListFile.read(settings().mail_file_maillist.value, [](FileBytes bytes) {
+        parseMailLists(keep(std::move(bytes)), maillist_list);
+    });
 }
 
 void writeMailListFile() {
-    rewriteDataFile(settings().mail_file_maillist,
-                    [](ByteSink &sink) { formatMailLists(maillist_list, sink); });
+    mailListFile.rewrite(settings().mail_file_maillist.value,
+                         [](ByteSink &sink) { formatMailLists(maillist_list, sink); });
 }

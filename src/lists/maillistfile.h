@@ -75,13 +75,20 @@ extern RecordChain<maillist_entry> maillist_list;
 void parseMailLists(KeptText bytes, RecordChain<maillist_entry> &lists);
 
 /// Addresses that begin with "#" are left out: such a line would end its section and take the
-/// addresses behind it along.
+/// addresses behind it along. So would the rest of one of more than 249 bytes, which the file's
+/// reader takes for a line of its own.
 void formatMailLists(const RecordChain<maillist_entry> &lists, ByteSink &sink);
 
 /// The addresses of a plain text file: every line that holds "@", whole. A line is taken in pieces
 /// of at most 254 bytes, and each address is put at the head. They alone are kept. Throws
 /// std::bad_alloc.
 AddressChain parseAddressLines(std::string_view bytes);
+
+/// The most bytes to be typed of a line: with its line feed it is read in one piece.
+constexpr std::size_t longestTyped = 248;
+
+/// How many of them are left for this text of a list.
+std::size_t mostBytesOf(KeptText maillist_entry::*field);
 
 /// Fills maillist_list anew from the file; empty when it cannot be read.
 void readMailListFile();

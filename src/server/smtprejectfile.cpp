@@ -1,12 +1,15 @@
 #include "server/smtprejectfile.h"
 
-#include "config/datafile.h"
+#include "base/textfile.h"
+#include "config/settings.h"
 
 #include <cctype>
 
 RecordChain<smtpreject_entry> smtpreject_list;
 
 namespace {
+
+ProductFile rejectFile;
 
 constexpr std::size_t longestPiece = 249;
 
@@ -38,15 +41,12 @@ void formatSmtpRejects(const RecordChain<smtpreject_entry> &list, ByteSink &sink
 
 void readSmtpRejectFile() {
     smtpreject_list.clear();
-    try {
-        if (const auto bytes = readDataFile(settings().mail_file_smtpreject)) {
-            parseSmtpRejects(*bytes, smtpreject_list);
-        }
-    } catch (const std::bad_alloc &) { // The records made until here stay.
-    }
+    rejectFile.read(settings().mail_file_smtpreject.value, [](FileBytes bytes) {
+        parseSmtpRejects(keep(std::move(bytes)), smtpreject_list);
+    });
 }
 
 void writeSmtpRejectFile() {
-    rewriteDataFile(settings().mail_file_smtpreject,
-                    [](ByteSink &sink) { formatSmtpRejects(smtpreject_list, sink); });
+    rejectFile.rewrite(settings().mail_file_smtpreject.value,
+                       [](ByteSink &sink) { formatSmtpRejects(smtpreject_list, sink); });
 }
