@@ -10,13 +10,14 @@
 #include "fetch/pophosts.h"
 #include "lists/maillist.h"
 #include "lists/maillistfile.h"
+#include "platform/process.h"
 #include "server/maildebatch.h"
 #include "server/mailimap.h"
 #include "server/mailpop3.h"
 #include "server/mailsmtp.h"
 #include "server/smtprejectfile.h"
 
-#include <cstdlib>
+#include <new>
 
 namespace {
 
@@ -28,16 +29,15 @@ void readFiles() {
     parsePopHosts(settings().pop_hosts.value);
 }
 
-void writeFiles() {
+/// A signal that ends the program does so between two applies, not between two files.
+void writeFiles(bool areSettingsStored) {
+    const EndSignalsHeld held;
     writeAliasFile();
     writeSmtpRejectFile();
     writeMailListFile();
-    writeMasterConfig();
-}
-
-void reconfigureServices() {
-    // What the command reports is its own business; the files are written whatever it says.
-    [[maybe_unused]] const int status = std::system(productPaths().reconfigureCommand);
+    if (areSettingsStored) {
+        writeMasterConfig();
+    }
 }
 
 } // namespace
@@ -68,14 +68,20 @@ KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
 
 void KTarvexApplication::applyChanges() {
     // Delivery stores before the fetchers, unlike the order of the tabs.
+    bool areSettingsStored = true;
     for (KConfigWidget *page : std::initializer_list<KConfigWidget *>{
              smtp_, pop3_, imap_, delivery_, fetch_, alias_, lists_}) {
-        if (page != nullptr) {
-            page->storeValues();
+        try {
+            if (page != nullptr) {
+                page->storeValues();
+            }
+        } catch (const std::bad_alloc &) { // What a page could not store is still in its fields.
+            areSettingsStored = false;
         }
     }
-    writeFiles();
-    reconfigureServices();
+    writeFiles(areSettingsStored);
+    // What the command reports is its own business; the files are written whatever it says.
+    runShellCommand(productPaths().reconfigureCommand);
 }
 
 template <class Page>

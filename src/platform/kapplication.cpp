@@ -1,13 +1,18 @@
 #include "platform/kapplication.h"
 
+#include <QAbstractButton>
 #include <QApplication>
 #include <QDir>
+#include <QKeyEvent>
 #include <QLibraryInfo>
 #include <QTranslator>
 
+#include <algorithm>
+#include <cctype>
 #include <clocale>
 #include <cstdio>
 #include <cstdlib>
+#include <new>
 #include <utility>
 #include <vector>
 
@@ -65,6 +70,81 @@ std::unique_ptr<QTranslator> toolkitTexts() {
                : nullptr;
 }
 
+/// The toolkit's application, which lets an event through or not.
+class Toolkit : public QApplication {
+public:
+    using QApplication::QApplication;
+
+    /// An event that runs out of memory is over; the program is not, nor is a dialog that is open.
+    bool notify(QObject *receiver, QEvent *event) override {
+        if (isDropped(receiver, event)) {
+            return true;
+        }
+        try {
+            return QApplication::notify(receiver, event);
+        } catch (const std::bad_alloc &) {
+            return false;
+        }
+    }
+
+    void dropPendingInput() {
+        isDropping_ = true;
+        QGuiApplication::sync();
+        isDropping_ = false;
+    }
+
+private:
+    bool isDropped(QObject *receiver, QEvent *event) {
+        switch (event->type()) {
+        case QEvent::KeyRelease:
+            releasedKey_ = static_cast<QKeyEvent *>(event)->key();
+            releasedAt_ = static_cast<QKeyEvent *>(event)->timestamp();
+            return false;
+        case QEvent::KeyPress:
+            return isDropping_ || pressesButtonAgain(receiver, *static_cast<QKeyEvent *>(event));
+        case QEvent::Shortcut:
+        case QEvent::MouseButtonPress:
+        case QEvent::MouseButtonDblClick:
+        case QEvent::Wheel:
+            return isDropping_;
+        default: // Releases among them: alone they do nothing, but no press must lack its own.
+            return false;
+        }
+    }
+
+    /// Whether a key that is held down would press a button once more. A repetition that reaches a
+    /// window just opened is not marked as one: it is a press at the time of the release before.
+    bool pressesButtonAgain(QObject *receiver, const QKeyEvent &press) const {
+        const bool isReturn = press.key() == Qt::Key_Return || press.key() == Qt::Key_Enter;
+        const bool isSpaceOnButton =
+            press.key() == Qt::Key_Space && qobject_cast<QAbstractButton *>(receiver) != nullptr;
+        const bool isRepeated =
+            press.isAutoRepeat() || (press.key() == releasedKey_ && press.timestamp() != 0 &&
+                                     press.timestamp() == releasedAt_);
+        return isRepeated && (isReturn || isSpaceOnButton);
+    }
+
+    bool isDropping_ = false;
+    int releasedKey_ = 0;
+    quint64 releasedAt_ = 0; ///< In the display's milliseconds.
+};
+
+/// Where the locale lower-cases a letter of the keys in a way of its own, as the Turkish ones do
+/// with I, this thread compares and classifies characters by the C locale's table.
+void useTableForKeys() {
+    const auto isLowered = [](char letter) { return std::tolower(letter) == letter - 'A' + 'a'; };
+    const std::string_view letters = "ABCDEFGHIJKLMNOPQRSTUVWXYZ";
+    if (std::ranges::all_of(letters, isLowered)) {
+        return;
+    }
+    // Messages and typing go by the rest of the locale, and by that of the process. In use until
+    // the end, hence never freed.
+    const locale_t own = newlocale(LC_CTYPE_MASK, "C", duplocale(LC_GLOBAL_LOCALE));
+    if (own != nullptr) {
+        uselocale(own);
+    }
+}
+
 } // namespace
 
 QString KLocale::translate(const char *text) const {
@@ -85,10 +165,11 @@ KApplication::KApplication(const char *program, const char *name, bool hasDispla
         const DisplayProblems problems{name};
         // What the program shows reads from left to right, whatever the toolkit's texts do.
         QGuiApplication::setLayoutDirection(Qt::LeftToRight);
-        toolkit_ = std::make_unique<QApplication>(toolkitArgumentCount_, toolkitArguments_);
+        toolkit_ = std::make_unique<Toolkit>(toolkitArgumentCount_, toolkitArguments_);
     } else {
         toolkit_ = std::make_unique<QCoreApplication>(toolkitArgumentCount_, toolkitArguments_);
     }
+    useTableForKeys();
     QCoreApplication::setApplicationName(name);
     getLocale()->open(name, shared(QStringLiteral("locale")));
     if (hasDisplay) {
@@ -99,6 +180,12 @@ KApplication::KApplication(const char *program, const char *name, bool hasDispla
 }
 
 KApplication::~KApplication() = default;
+
+void KApplication::dropPendingInput() {
+    if (auto *toolkit = dynamic_cast<Toolkit *>(qApp)) {
+        toolkit->dropPendingInput();
+    }
+}
 
 KLocale *KApplication::getLocale() {
     static KLocale locale;

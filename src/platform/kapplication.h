@@ -41,7 +41,11 @@ private:
 };
 
 /// The process's toolkit application. Its construction takes the process's locale from the
-/// environment, so character classes follow that from then on.
+/// environment, so character classes follow that from then on; only the keys' letters are compared
+/// alike in every locale.
+///
+/// A key that is held down presses a button once. What runs out of memory (std::bad_alloc) while an
+/// event is answered ends with that event.
 class KApplication {
 public:
     /// Without a display (`hasDisplay` false) there are no widgets, but the locale and the paths
@@ -53,6 +57,9 @@ public:
     virtual ~KApplication();
 
     static KLocale *getLocale();
+
+    /// Drops the keys and clicks that have arrived and were not answered yet.
+    static void dropPendingInput();
 
     /// The folder or file `name` among what is installed beside the program (share/...). It is
     /// found from the program's own place, so that a build tree works like an installation.

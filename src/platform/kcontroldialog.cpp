@@ -2,6 +2,7 @@
 
 #include "platform/helpkey.h"
 #include "platform/helpwindow.h"
+#include "platform/kapplication.h"
 #include "platform/kconfigwidget.h"
 #include "platform/lowscreen.h"
 
@@ -119,4 +120,5 @@ void KControlDialog::apply() {
     QApplication::setOverrideCursor(Qt::WaitCursor);
     emit applied();
     QApplication::restoreOverrideCursor();
+    KApplication::dropPendingInput();
 }

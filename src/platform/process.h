@@ -1,0 +1,28 @@
+#pragma once
+
+#include <array>
+#include <csignal>
+
+/// What the process shares with the one that started it: signals, descriptors, commands.
+
+/// To be called before anything is opened. Standard input, output and error become /dev/null where
+/// they are closed: the next file, or the display's connection, would otherwise take their place
+/// and get the program's messages. Output to a pipe that nobody reads ends nothing from here on.
+void prepareProcess();
+
+/// Runs the command in the shell and waits for its end. It finds the signals as this process found
+/// them.
+void runShellCommand(const char *command);
+
+/// As long as one lives, SIGTERM, SIGINT and SIGHUP wait; then they do what they would have done.
+/// One at a time.
+class EndSignalsHeld {
+public:
+    EndSignalsHeld();
+    EndSignalsHeld(const EndSignalsHeld &) = delete;
+    EndSignalsHeld &operator=(const EndSignalsHeld &) = delete;
+    ~EndSignalsHeld();
+
+private:
+    std::array<struct sigaction, 3> before_{};
+};
