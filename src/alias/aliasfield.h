@@ -10,3 +10,11 @@ inline FieldRule oneWordRule() {
             0,
             QStringLiteral("One word, without blanks and commas")};
 }
+
+/// The same for what a line begins with: the file skips lines that begin with these.
+inline FieldRule aliasAddressRule() {
+    FieldRule rule = oneWordRule();
+    rule.refusedFirst = QStringLiteral("#|");
+    rule.toolTip += QStringLiteral("; not beginning with \"#\" or \"|\"");
+    return rule;
+}

@@ -22,7 +22,7 @@ EditAlias::EditAlias(QWidget *parent, const char *name, const alias_entry *alias
     : FormDialog(parent, name, "Email Address Aliasing") {
     address_ = addField(translatable("&Address:"), {70, 18},
                         alias != nullptr ? alias->address : KeptText{});
-    applyRule(address_, oneWordRule());
+    applyRule(address_, aliasAddressRule());
 
     auto *group = new ListGroup("Aliases", {250, 70}, this);
     box_ = group->box();

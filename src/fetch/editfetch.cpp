@@ -10,7 +10,7 @@ namespace {
 
 /// A field for an array of `size` bytes.
 FieldRule ruleFor(std::size_t size) {
-    const int mostBytes = static_cast<int>(size) - 1;
+    const auto mostBytes = static_cast<qsizetype>(size) - 1;
     return {QStringLiteral(":@,"),
             {},
             mostBytes,

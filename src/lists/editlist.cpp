@@ -2,6 +2,7 @@
 
 #include "platform/knumericspinbox.h"
 #include "platform/lowscreen.h"
+#include "widgets/fieldrule.h"
 #include "widgets/fieldtext.h"
 #include "widgets/numberfield.h"
 
@@ -162,6 +163,7 @@ QGroupBox *EditList::newTexts(const maillist_entry &list) {
 QLineEdit *EditList::addText(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
                              KeptText maillist_entry::*field, const maillist_entry &list) {
     QLineEdit *edit = addField(row, caption, captions, list.*field);
+    applyRule(edit, lengthRule(mostBytesOf(field)));
     stores_.emplace_back(
         [edit, field](maillist_entry &record) { record.*field = fieldText(edit, record.*field); });
     return edit;

@@ -2,11 +2,16 @@
 
 #include "lists/listdialog.h"
 #include "lists/maillistfile.h"
+#include "widgets/fieldrule.h"
 #include "widgets/fieldtext.h"
+#include "widgets/fieldtip.h"
 #include "widgets/leastsize.h"
 
 #include <QCheckBox>
+#include <QLineEdit>
 #include <QVBoxLayout>
+
+#include <algorithm>
 
 namespace {
 
@@ -20,13 +25,25 @@ EditListMember::EditListMember(QWidget *parent, const char *name, const maillist
     : FormDialog(parent, name, "Mail List Address"),
       email_{addField(translatable("&Email:"), listDialogLabel,
                       entry != nullptr ? addressShown(*entry) : KeptText{})},
-      digest_{new QCheckBox(QStringLiteral("Digest List"))} {
+      digest_{new QCheckBox(QStringLiteral("Digest List"))},
+      mostBytes_{std::max(longestTyped, entry != nullptr ? entry->addr.size() : 0)} {
+    applyRule(email_, lengthRule(longestTyped));
     digest_->setFixedHeight(leastSize(digest_, {0, checkBoxHeight}).height());
     digest_->setChecked(entry != nullptr && isOnDigest(*entry));
     rows()->setSpacing(spaceAroundDigest);
     rows()->addWidget(digest_);
     addButtons(listDialogBorder, spaceAroundDigest);
     fixSize(dialogSize, dialogSize);
+}
+
+void EditListMember::accept() {
+    // The digest's mark takes a byte of the line as well.
+    const std::size_t digestMark = digest_->isChecked() ? 1 : 0;
+    if (!showsPartOnly(email_) && fieldBytes(email_).size() + digestMark > mostBytes_) {
+        showFieldTip(email_, lengthRule(mostBytes_ - digestMark).toolTip);
+        return;
+    }
+    FormDialog::accept();
 }
 
 KeptText EditListMember::addr(const maillist_addr_entry &before) const {

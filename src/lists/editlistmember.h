@@ -17,7 +17,11 @@ public:
     /// As a record takes it that holds `before`: behind ":" for a member on the digest.
     [[nodiscard]] KeptText addr(const maillist_addr_entry &before) const;
 
+protected:
+    void accept() override;
+
 private:
     QLineEdit *email_;
     QCheckBox *digest_;
+    std::size_t mostBytes_; ///< Of the record's text.
 };

@@ -14,7 +14,11 @@ namespace {
 class RuleValidator : public QValidator {
 public:
     RuleValidator(QLineEdit *field, const FieldRule &rule)
-        : QValidator(field), rule_{rule}, textSet_{field->text()} {}
+        : QValidator(field),
+          rule_{rule},
+          textSet_{field->text()},
+          mostBytes_{
+              std::max(rule.mostBytes, static_cast<qsizetype>(bytesFromText(textSet_).size()))} {}
 
     State validate(QString &input, int &position) const override {
         refusal_ = rule_.toolTip;
@@ -49,7 +53,7 @@ private:
     /// What was put in ends at `position`: there it is cut, so that nothing that stood in the field
     /// before is pushed out.
     void cutToFit(QString &input, int &position) const {
-        auto excess = static_cast<qsizetype>(bytesFromText(input).size()) - rule_.mostBytes;
+        auto excess = static_cast<qsizetype>(bytesFromText(input).size()) - mostBytes_;
         int kept = position;
         while (excess > 0 && kept > 0) {
             const bool isPair = kept > 1 && input.at(kept - 1).isLowSurrogate() &&
@@ -65,6 +69,7 @@ private:
 
     FieldRule rule_;
     QString textSet_;
+    qsizetype mostBytes_; ///< What was stored longer may be edited, but not grow.
     mutable QString refusal_;
 };
 
@@ -73,6 +78,13 @@ void showRefusal(const QLineEdit *field) {
 }
 
 } // namespace
+
+FieldRule lengthRule(std::size_t mostBytes) {
+    return {{},
+            {},
+            static_cast<qsizetype>(mostBytes),
+            QStringLiteral("At most %1 bytes").arg(mostBytes)};
+}
 
 void applyRule(QLineEdit *field, const FieldRule &rule) {
     if (field->isReadOnly()) {
@@ -89,16 +101,25 @@ void applyRule(QLineEdit *field, const FieldRule &rule) {
     }
 }
 
+bool holdsRefusedText(const QLineEdit *field) {
+    QString accepted = field->text();
+    int position = static_cast<int>(accepted.size());
+    if (field->isReadOnly() || field->validator() == nullptr ||
+        (field->validator()->validate(accepted, position) == QValidator::Acceptable &&
+         accepted == field->text())) {
+        return false;
+    }
+    showRefusal(field);
+    return true;
+}
+
 void replaceByRule(QLineEdit *field, const QString &text) {
     if (field->isReadOnly()) {
         return;
     }
-    QString accepted = text;
-    int position = static_cast<int>(text.size());
-    if (field->validator() != nullptr &&
-        field->validator()->validate(accepted, position) != QValidator::Acceptable) {
-        showRefusal(field);
-        return;
+    const QString before = field->text();
+    field->setText(text);
+    if (holdsRefusedText(field)) {
+        field->setText(before);
     }
-    field->setText(accepted);
 }

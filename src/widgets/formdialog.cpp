@@ -80,6 +80,7 @@ QLineEdit *FormDialog::addField(QHBoxLayout *row, TranslatableText caption, Capt
     showBytes(field, bytes);
     row->addWidget(captions.newCaption(translated(caption), field));
     addAsField(row, field);
+    fields_.push_back(field);
     return field;
 }
 
@@ -118,6 +119,12 @@ void FormDialog::addButtons(int aboveRows, int aboveButtons, Shrinking shrinking
 void FormDialog::fixSize(QSize dialog, QSize panel) {
     besidePanel_ = dialog - panel;
     setFixedSize(dialog.expandedTo(layout_->totalMinimumSize()));
+}
+
+void FormDialog::accept() {
+    if (std::ranges::none_of(fields_, holdsRefusedText)) {
+        QDialog::accept();
+    }
 }
 
 void FormDialog::resizeEvent(QResizeEvent *event) {

@@ -6,6 +6,7 @@
 #include <QDialog>
 
 #include <string_view>
+#include <vector>
 
 class QFrame;
 class QHBoxLayout;
@@ -49,10 +50,13 @@ protected:
     /// more. Where the panel would reach into the button row, it ends above it.
     void fixSize(QSize dialog, QSize panel);
 
+    /// Does not close on a text that its field's rule refuses.
+    void accept() override;
     void resizeEvent(QResizeEvent *event) override;
 
 private:
     std::optional<int> aroundFieldText_;
+    std::vector<QLineEdit *> fields_;
     QFrame *panel_;
     QVBoxLayout *layout_;
     QVBoxLayout *rows_;

@@ -6,6 +6,7 @@
 #include <QDialog>
 
 #include <functional>
+#include <new>
 #include <string>
 #include <string_view>
 #include <type_traits>
@@ -16,15 +17,26 @@
 /// record, from the head, that shows the same bytes. Where texts are equal, rows and records are
 /// the same only as counted texts.
 
+/// When memory runs out, rows stay as they are. The records come first: they are in the file.
+template <class Change>
+void tryRows(Change change) {
+    try {
+        change();
+    } catch (const std::bad_alloc &) {
+    }
+}
+
 template <class Record, class Shown>
 void appendRows(QListBox *box, const RecordChain<Record> &records, Shown shown) {
     static_assert(!std::is_same_v<std::invoke_result_t<Shown, const Record &>, std::string>,
                   "the views would outlive their texts");
-    std::vector<std::string_view> texts;
-    for (const Record &record : records) {
-        texts.push_back(shown(record));
-    }
-    box->append(texts);
+    tryRows([&] {
+        std::vector<std::string_view> texts;
+        for (const Record &record : records) {
+            texts.push_back(shown(record));
+        }
+        box->append(texts);
+    });
 }
 
 /// The link to the record that shows `text`; null when there is no text or no such record.
@@ -51,12 +63,6 @@ inline const char *currentText(const QListBox *box) {
     return row ? box->text(*row).data() : nullptr;
 }
 
-/// Puts the record at the head of its list and its row at the bottom of the box.
-template <class Record, class Shown>
-void addShown(QListBox *box, Record **head, Record record, Shown shown) {
-    box->append(shown(prependRecord(head, std::move(record))));
-}
-
 inline void changeCurrentRow(QListBox *box, std::string_view text) {
     if (const std::optional<int> row = box->currentRow()) {
         box->changeText(*row, text);
@@ -74,16 +80,36 @@ void removeCurrent(QListBox *box, Record **head, Shown shown) {
     }
 }
 
-/// Asks in a `Dialog` named "Edit" for a new record and adds it, unless that is cancelled.
-/// `read(owner, &record, &dialog)` takes the input over; a slot of the owner will do.
+/// Shows the dialog until it is cancelled or `take()` has taken its input over. When memory runs
+/// out in that (std::bad_alloc), the dialog is there again, with all that was typed.
+template <class Take>
+void askUntilTaken(QDialog &dialog, Take take) {
+    while (dialog.exec() == QDialog::Accepted) {
+        try {
+            take();
+            return;
+        } catch (const std::bad_alloc &) {
+        }
+    }
+}
+
+/// Asks in a `Dialog` named "Edit" for a new record and adds it, unless that is cancelled: at the
+/// head of its list, with a row at the bottom of the box. `read(owner, &record, &dialog)` takes the
+/// input over; a slot of the owner will do. It must give away what the dialog cannot give twice
+/// only when nothing of it can fail any more.
 template <class Dialog, class Owner, class Record, class Read, class Shown>
 void addByDialog(Owner *owner, QListBox *box, Record **head, Read read, Shown shown) {
     Dialog dialog{owner, "Edit", nullptr};
-    if (dialog.exec() == QDialog::Accepted) {
-        Record record;
-        std::invoke(read, owner, &record, &dialog);
-        addShown(box, head, std::move(record), shown);
-    }
+    askUntilTaken(dialog, [&] {
+        Record &record = prependRecord(head, Record{});
+        try {
+            std::invoke(read, owner, &record, &dialog);
+        } catch (const std::bad_alloc &) {
+            removeRecord(head);
+            throw;
+        }
+        tryRows([&] { box->append(shown(record)); });
+    });
 }
 
 /// Changes the record that shows `text` in a `Dialog` named "edit", and the current row with it.
@@ -96,8 +122,8 @@ void changeByDialog(Owner *owner, QListBox *box, Record **head, const char *text
         return;
     }
     Dialog dialog{owner, "edit", record};
-    if (dialog.exec() == QDialog::Accepted) {
+    askUntilTaken(dialog, [&] {
         std::invoke(read, owner, record, &dialog);
-        changeCurrentRow(box, shown(*record));
-    }
+        tryRows([&] { changeCurrentRow(box, shown(*record)); });
+    });
 }
