@@ -1,12 +1,15 @@
 #include "alias/editalias.h"
 #include "fetch/editfetch.h"
 #include "fetch/pophosts.h"
+#include "lists/editlistmember.h"
+#include "lists/maillistfile.h"
 #include "platform/knumericspinbox.h"
 #include "widgets/fieldtext.h"
 
 #include "datafiles.h"
 #include "dialogdriver.h"
 
+#include <QCheckBox>
 #include <QToolTip>
 #include <QWheelEvent>
 
@@ -27,6 +30,14 @@ std::string pasted(const std::string &row, NewField newField) {
     field->setCursorPosition(static_cast<int>(parts.at(0).size()));
     paste(field, parts.at(1));
     return (field->isReadOnly() ? "read-only: " : "") + fieldText(field, stored);
+}
+
+/// Whether the dialog closes on a text that came neither from keys nor from the clipboard.
+bool isTakenBy(QDialog *dialog, QLineEdit *field, const QString &text) {
+    dialog->show();
+    field->setText(text);
+    press(dialog, "OK");
+    return dialog->result() == QDialog::Accepted && !dialog->isVisible();
 }
 
 } // namespace
@@ -81,15 +92,40 @@ private slots:
             checkRows([&](const std::string &row) { return pasted(row, inDialog); },
                       ('[' + std::string{caption} + ']').c_str());
         }
+        std::optional<EditListMember> member;
+        const auto asMember = [&member](KeptText stored) {
+            const maillist_addr_entry entry{stored};
+            member.emplace(nullptr, "edit", &entry);
+            return fieldBeside(&*member, "&Email:");
+        };
+        checkRows([&](const std::string &row) { return pasted(row, asMember); }, "[&Email:]");
     }
 
     void aliasField() {
-        const EditAlias dialog{nullptr, "edit", nullptr};
+        EditAlias dialog{nullptr, "edit", nullptr};
         QLineEdit *field = fieldBeside(&dialog, "&Address:");
-        type(field, "!n e,w@#");
+        type(field, "#|!n e,w@#");
         for (const char *refused : {"a b", "a,b", "a\tb", "a\nb"}) {
             paste(field, refused);
             QCOMPARE(field->text(), "!new@#");
+        }
+        for (const auto &[text, isTaken] : {std::pair{"a b", false}, {"#a", false}, {"a#", true}}) {
+            QCOMPARE(isTakenBy(&dialog, field, text), isTaken);
+        }
+    }
+
+    void memberTakesALineOfTheFile() {
+        using Case = std::tuple<std::size_t, std::size_t, bool, std::size_t>;
+        for (const auto &[stored, text, isOnDigest, taken] :
+             {Case{0, 249, false, 248}, Case{0, 247, true, 248}, Case{0, 248, true, 0},
+              Case{249, 248, true, 249}}) {
+            const maillist_addr_entry entry{keep(std::string(stored, ':'))};
+            EditListMember dialog{nullptr, "edit", &entry};
+            dialog.findChild<QCheckBox *>()->setChecked(isOnDigest);
+            QLineEdit *field = fieldBeside(&dialog, "&Email:");
+            const bool isTaken = isTakenBy(&dialog, field, QString{static_cast<int>(text), 'x'});
+            QCOMPARE(isTaken ? dialog.addr(entry).size() : 0, taken);
+            QVERIFY(isTaken || QToolTip::text() == "At most 247 bytes");
         }
     }
 

@@ -110,9 +110,12 @@ private slots:
     }
 
     void memberThatWouldEndItsSectionIsLeftOut() {
-        const std::string list = block("a", "0", ":b@x\n");
+        const std::string list = block("a", "0", std::string(249, 'x') + '\n');
         rewrittenLists(list);
-        prependRecord(&maillist_list.head->member.head, {keep("#left out")});
+        removeRecord(&maillist_list.head->member.head); // The line feed behind the 249 bytes.
+        for (const std::string &leftOut : {"#left out"s, std::string(250, 'x')}) {
+            prependRecord(&maillist_list.head->member.head, {keep(leftOut)});
+        }
         QCOMPARE(whole(formatMailLists, maillist_list), list);
     }
 

@@ -124,6 +124,34 @@ private slots:
         QVERIFY(bytesAt(file).starts_with('n'));
     }
 
+    void whatWasNotReadWholeIsNeverRewritten() {
+        const std::string broken = "/proc/self/mem"; // Opens, but cannot be read from its start.
+        const std::string loop = folder + "/loop";
+        QVERIFY(symlink("loop", loop.c_str()) == 0 && rewriteFile(file, "old"));
+        const auto take = [](const FileBytes &bytes) {
+            if (std::string_view{bytes} == "much") {
+                throw std::bad_alloc{};
+            }
+        };
+        const auto format = [](ByteSink &sink) { sink.put("new"); };
+        ProductFile product;
+        for (const auto &[path, bytes, result, expected] : {std::tuple{file, "old", 0, "new"},
+                                                            {file, "much", 2, "much"},
+                                                            {folder + "/none", "", 1, "new"}}) {
+            if (*bytes != '\0') {
+                rewriteFile(path, bytes);
+            }
+            QCOMPARE(product.read(path, take), result);
+            product.rewrite(path, format);
+            QVERIFY(bytesAt(path) == expected);
+        }
+        for (const std::string &path : {broken, loop, folder}) {
+            QCOMPARE(product.read(path, take), 1);
+            product.rewrite(file, format);
+            QVERIFY(bytesAt(file) == "much");
+        }
+    }
+
     /// Around the size of the buffer, in pieces and in one.
     void longContentsArriveInTheirOrder() {
         std::mt19937 random{1};

@@ -119,7 +119,10 @@ void replaceByRule(QLineEdit *field, const QString &text) {
     }
     const QString before = field->text();
     field->setText(text);
-    if (holdsRefusedText(field)) {
-        field->setText(before);
+    if (field->text() != text) { // It was cut, and would lead elsewhere.
+        showRefusal(field);
+    } else if (!holdsRefusedText(field)) {
+        return;
     }
+    field->setText(before);
 }

@@ -150,6 +150,47 @@ private slots:
                  given("applied/alias") + given("applied/reject"));
     }
 
+    void whatArrivesDuringAnApplyIsDropped() {
+        layProduct();
+        auto *apply = captioned(mainDialog(), &QAbstractButton::text, "Apply");
+        for (const auto type : {QEvent::MouseButtonPress, QEvent::MouseButtonRelease}) {
+            const QPoint centre = apply->rect().center();
+            QCoreApplication::postEvent(apply,
+                                        new QMouseEvent(type, centre, apply->mapToGlobal(centre),
+                                                        Qt::LeftButton, Qt::LeftButton, {}));
+        }
+        for (const auto type : {QEvent::KeyPress, QEvent::KeyRelease}) {
+            QCoreApplication::postEvent(apply, new QKeyEvent(type, Qt::Key_Space, {}));
+        }
+        apply->click();
+        QCoreApplication::processEvents();
+        QCOMPARE(read(runs), "ran\n");
+        press(mainDialog(), "Apply");
+        QCOMPARE(read(runs), "ran\nran\n");
+    }
+
+    /// Whether it is marked as a repetition or not.
+    void heldKeyPressesAButtonOnce() {
+        tabs()->setCurrentIndex(5);
+        auto *add = captioned(page("alias"), &QAbstractButton::text, "Add...");
+        for (const bool isMarked : {true, false}) {
+            QKeyEvent release{QEvent::KeyRelease, Qt::Key_Return, {}};
+            QKeyEvent again{QEvent::KeyPress, Qt::Key_Return, {}, {}, isMarked};
+            release.setTimestamp(5);
+            again.setTimestamp(isMarked ? 6 : 5);
+            QVERIFY(!withDialog(
+                [&] {
+                    QApplication::sendEvent(add, &release);
+                    QApplication::sendEvent(add, &again);
+                },
+                [](QWidget *dialog) { dialog->close(); }));
+        }
+        QVERIFY(withDialog([&] { QTest::keyClick(add, Qt::Key_Return); },
+                           [](QWidget *dialog) { dialog->close(); }));
+        mainDialog()->activateWindow();
+        QVERIFY(QTest::qWaitForWindowActive(mainDialog()));
+    }
+
     void captionsLettersReachTheirFields() {
         QStringList pressed;
         for (int tab = 0; tab < tabs()->count(); ++tab) {
