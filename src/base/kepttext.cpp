@@ -1,12 +1,14 @@
 #include "base/kepttext.h"
 
+#include "base/bulkmemory.h"
+
 #include <algorithm>
 #include <utility>
 #include <vector>
 
 namespace {
 
-constexpr std::size_t blockSize = 65'536;
+constexpr std::size_t blockSize = bulkSize; // Rarely more than one; only what is used is touched.
 
 /// All that was ever kept; never destroyed, for texts are in use until the last moment.
 std::vector<std::unique_ptr<char[]>> &kept() {
@@ -20,7 +22,7 @@ std::size_t roomLeft = 0;
 
 char *newBlock(std::size_t size) {
     // Without make_unique, which would fill it with zeros first.
-    std::unique_ptr<char[]> block{new char[size]};
+    std::unique_ptr<char[]> block{newBulk<char>(size)};
     return kept().emplace_back(std::move(block)).get();
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "base/largepages.h"
+#include "base/bulkmemory.h"
 
 #include <cstddef>
 #include <new>
@@ -51,9 +51,8 @@ private:
             return std::exchange(free_, free_->next);
         }
         if (fresh_ == freshEnd_) {
-            fresh_ = new Place[nextPlaces_];
+            fresh_ = newBulk<Place>(nextPlaces_);
             freshEnd_ = fresh_ + nextPlaces_;
-            adviseLargePages(fresh_, nextPlaces_ * sizeof(Place));
             nextPlaces_ = 2 * nextPlaces_ < mostPlaces ? 2 * nextPlaces_ : mostPlaces;
         }
         return fresh_++;

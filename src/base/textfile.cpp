@@ -1,6 +1,6 @@
 #include "base/textfile.h"
 
-#include "base/largepages.h"
+#include "base/bulkmemory.h"
 
 #include <cerrno>
 #include <csignal>
@@ -149,8 +149,7 @@ FileRead readWholeFile(const std::string &path) {
     // One byte more than the size, so that the end is found without growing; a file that says
     // nothing of its size, or grows meanwhile, is read to its end all the same.
     std::size_t size = static_cast<std::size_t>(status.st_size) + 1;
-    FileBytes read{std::unique_ptr<char[]>{new char[size]}};
-    adviseLargePages(read.bytes.get(), size);
+    FileBytes read{std::unique_ptr<char[]>{newBulk<char>(size)}};
     for (;;) {
         const ssize_t count =
             ::read(file.number(), read.bytes.get() + read.length, size - read.length);
@@ -166,7 +165,7 @@ FileRead readWholeFile(const std::string &path) {
         read.length += static_cast<std::size_t>(count);
         if (read.length == size) {
             size = 2 * size + 4096;
-            std::unique_ptr<char[]> larger{new char[size]};
+            std::unique_ptr<char[]> larger{newBulk<char>(size)};
             std::memcpy(larger.get(), read.bytes.get(), read.length);
             read.bytes = std::move(larger);
         }

@@ -1,5 +1,7 @@
 #include "config/settingvalues.h"
 
+#include "base/bulkmemory.h"
+
 #include <algorithm>
 #include <array>
 #include <cctype>
@@ -61,6 +63,7 @@ std::optional<std::string> textSetting(std::optional<std::string> &field, TextOr
         return field;
     }
     try {
+        leaveMemoryForToolkit(text->size());
         field = std::string{*text};
     } catch (const std::bad_alloc &) {
         field.reset();

@@ -2,6 +2,7 @@
 
 #include <cstdlib>
 #include <fcntl.h>
+#include <malloc.h>
 #include <unistd.h>
 
 namespace {
@@ -32,6 +33,8 @@ void prepareProcess() {
             [[maybe_unused]] const int opened = ::open("/dev/null", O_RDWR);
         }
     }
+    // A heap for each of the toolkit's threads would set aside 128 MB of address space for itself.
+    ::mallopt(M_ARENA_MAX, 1);
     struct sigaction ignore {};
     ignore.sa_handler = SIG_IGN;
     ::sigaction(SIGPIPE, &ignore, &pipeAction);

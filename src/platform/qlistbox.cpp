@@ -1,6 +1,6 @@
 #include "platform/qlistbox.h"
 
-#include "base/largepages.h"
+#include "base/bulkmemory.h"
 #include "platform/bytetext.h"
 
 #include <QAbstractListModel>
@@ -96,9 +96,10 @@ private:
     template <class Container>
     static void makeRoom(Container &container, std::size_t size) {
         if (size > container.capacity()) {
-            container.reserve(size + size / 8);
-            adviseLargePages(container.data(),
-                             container.capacity() * sizeof(typename Container::value_type));
+            const std::size_t room = size + size / 8;
+            leaveMemoryForToolkit(room * sizeof(typename Container::value_type));
+            container.reserve(room);
+            adviseLargePages(container.data(), room * sizeof(typename Container::value_type));
         }
     }
 
