@@ -47,7 +47,7 @@ private:
 
 /// A template's key line with the store's value, or as it is.
 MasterLine keyLine(std::string_view line) {
-    const std::size_t colon = line.find(':');
+    const std::size_t colon = beforeNul(line).find(':');
     if (colon != std::string_view::npos) {
         if (auto value = settingByKey(std::string{line.substr(1, colon - 1)}, std::nullopt)) {
             return {line.substr(0, colon), std::move(value)};
