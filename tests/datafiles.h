@@ -43,7 +43,7 @@ void checkRows(Convert convert, const char *section) {
         QVERIFY2(arrow != line.npos, line.c_str());
         const std::string seen = convert(decoded(line.substr(bytes, arrow - bytes)));
         const std::string expected = line.substr(arrow + 6, line.size() - arrow - 7);
-        QVERIFY2(seen == decoded(expected), (line + " but was " + seen).c_str());
+        QVERIFY2(seen == decoded(expected), line.append(" but was ").append(seen).c_str());
     }
     QVERIFY2(line.empty(), line.c_str());
 }
