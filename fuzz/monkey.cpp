@@ -157,9 +157,9 @@ void sendKey(QWidget *focus) {
             .split(' ');
     static const QStringList texts =
         textFromBytes(
-            decoded("ann@x~bob~bob~:carol@x~::d~#staff~|x~a,b c~%name:x~!x~$y~[spool]~-*e~x:y@z~"
-                    "#end~ \\tx\\v ~10.0.0.0/8, 1.2.3.4~config/load~config/load~\\xe9 \\xff~x{300}~"
-                    "a\\r\\nb@c\\n#endlist\\n~a\\0b@~\\xc3\\xa9\\xe2\\x80\\xa8~x{60000}"))
+            decoded("ann@x~bob~bob\\n~:carol@x\\n~::d~#staff~|x~a,b c~%name:x\\n~!x~$y~[spool]~"
+                    "-*e~x:y@z~\\n#end~ \\tx\\v ~10.0.0.0/8, 1.2.3.4~config/load~config/load~"
+                    "\\xe9 \\xff~x{300}~a\\r\\nb@c\\n#endlist\\n~a\\0b@~\\xc3\\xa9\\xe2~x{60000}"))
             .split('~');
     const int kind = below(10);
     const QString text = kind < 5   ? texts.at(below(texts.size()))
