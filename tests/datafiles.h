@@ -43,7 +43,7 @@ void checkRows(Convert convert, const char *section) {
         QVERIFY2(arrow != line.npos, line.c_str());
         const std::string seen = convert(decoded(line.substr(bytes, arrow - bytes)));
         const std::string expected = line.substr(arrow + 6, line.size() - arrow - 7);
-        QVERIFY2(seen == decoded(expected), (line + " but was " + seen).c_str());
+        QVERIFY2(seen == decoded(expected), line.append(" but was ").append(seen).c_str());
     }
     QVERIFY2(line.empty(), line.c_str());
 }
@@ -73,6 +73,24 @@ inline std::string newPath() {
     std::filesystem::remove_all(TEST_PRODUCT);
     std::filesystem::create_directories(TEST_PRODUCT);
     return TEST_PRODUCT "/file";
+}
+
+/// The bytes of a file among the application's test data, with the product's path in it.
+inline std::string given(const std::filesystem::path &name) {
+    QByteArray bytes = QByteArray::fromStdString(bytesAt(TEST_DATA "/app" / name));
+    return bytes.replace("@PRODUCT@", TEST_PRODUCT).toStdString();
+}
+
+/// A product tree in which every file has something that an apply changes in form.
+inline void layProduct() {
+    namespace fs = std::filesystem;
+    newPath();
+    const fs::path source = fs::path{TEST_DATA "/app/product"};
+    fs::copy(source, TEST_PRODUCT, fs::copy_options::recursive);
+    for (const auto &entry : fs::recursive_directory_iterator{source}) {
+        const fs::path name = entry.path().lexically_relative(source);
+        rewriteFile(fs::path{TEST_PRODUCT} / name, given("product" / name));
+    }
 }
 
 /// Up to `longest` random bytes, high ones among them; no NUL and none of `excluded`.

@@ -23,6 +23,17 @@ Child *captioned(const QWidget *window, QString (Child::*caption)() const, const
     return found == children.end() ? nullptr : *found;
 }
 
+/// In whichever window it is; null when there is none.
+template <class Widget>
+Widget *anywhere() {
+    for (const QWidget *window : QApplication::topLevelWidgets()) {
+        if (auto *widget = window->findChild<Widget *>()) {
+            return widget;
+        }
+    }
+    return nullptr;
+}
+
 template <class Field = QLineEdit>
 Field *fieldBeside(const QWidget *window, const QString &caption) {
     const QLabel *label = captioned(window, &QLabel::text, caption);

@@ -31,37 +31,8 @@ const fs::path runs = product / "runs"; ///< Has a line for each run of the comm
 
 std::string read(const fs::path &path) { return bytesAt(path.string()); }
 
-/// The bytes of a file among the test's data, with the product's path in it.
-std::string given(const fs::path &name) {
-    QByteArray bytes = QByteArray::fromStdString(read(fs::path{TEST_DATA "/app"} / name));
-    return bytes.replace("@PRODUCT@", TEST_PRODUCT).toStdString();
-}
-
-/// A product tree in which every file has something that an apply changes in form.
-void layProduct() {
-    fs::remove_all(product);
-    fs::create_directories(product);
-    const fs::path source = fs::path{TEST_DATA "/app/product"};
-    fs::copy(source, product, fs::copy_options::recursive);
-    for (const auto &entry : fs::recursive_directory_iterator{source}) {
-        const fs::path name = entry.path().lexically_relative(source);
-        rewriteFile(product / name, given("product" / name));
-    }
-}
-
 const std::string expectedFiles =
     given("applied/alias") + given("applied/reject") + given("applied/lists");
-
-/// In whichever window it is; null when there is none.
-template <class Widget>
-Widget *anywhere() {
-    for (const QWidget *window : QApplication::topLevelWidgets()) {
-        if (auto *widget = window->findChild<Widget *>()) {
-            return widget;
-        }
-    }
-    return nullptr;
-}
 
 QTabWidget *tabs() { return anywhere<QTabWidget>(); }
 
