@@ -96,7 +96,9 @@ struct Program : QProcess {
         ::close(ends[1]);
     }
     ~Program() override {
-        ::kill(-number, SIGKILL); // And whatever it has started.
+        if (number > 0) {
+            ::kill(-number, SIGKILL); // And whatever it has started.
+        }
         waitForFinished();
         ::close(line);
     }
