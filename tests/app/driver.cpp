@@ -28,10 +28,11 @@ static void pressNext() {
 }
 
 static void listen() {
+    auto *application = QCoreApplication::instance();
     fcntl(DRIVER_LINE, F_SETFD, FD_CLOEXEC);
     say('h');
-    auto *line = new QSocketNotifier(DRIVER_LINE, QSocketNotifier::Read, qApp);
-    QObject::connect(line, &QSocketNotifier::activated, qApp, pressNext);
-    QTimer::singleShot(0, qApp, [] { say('r'); });
+    auto *line = new QSocketNotifier(DRIVER_LINE, QSocketNotifier::Read, application);
+    QObject::connect(line, &QSocketNotifier::activated, application, pressNext);
+    QTimer::singleShot(0, application, [] { say('r'); });
 }
 Q_COREAPP_STARTUP_FUNCTION(listen)
