@@ -5,6 +5,7 @@
 #include <QDir>
 #include <QKeyEvent>
 #include <QLibraryInfo>
+#include <QThreadPool>
 #include <QTranslator>
 
 #include <algorithm>
@@ -166,6 +167,10 @@ KApplication::KApplication(const char *program, const char *name, bool hasDispla
         // What the program shows reads from left to right, whatever the toolkit's texts do.
         QGuiApplication::setLayoutDirection(Qt::LeftToRight);
         toolkit_ = std::make_unique<Toolkit>(toolkitArgumentCount_, toolkitArguments_);
+        // The toolkit paints large areas in threads of its pool. It would wait for ever for one
+        // that there is no memory to start, so the first one stays, and does.
+        QThreadPool::globalInstance()->setMaxThreadCount(1);
+        QThreadPool::globalInstance()->setExpiryTimeout(-1);
     } else {
         toolkit_ = std::make_unique<QCoreApplication>(toolkitArgumentCount_, toolkitArguments_);
     }
