@@ -393,7 +393,8 @@ private slots:
                                                 : before[master] < '1' ? "^1111$"
                                                                        : "^1111(ran)?$"};
                 QVERIFY2(wanted.match(after.c_str()).hasMatch(),
-                         (std::to_string(signal) + ": " + before + ", then " + after).c_str());
+                         qPrintable(QString::number(signal) + ": " + before.c_str() + ", then " +
+                                    after.c_str()));
             }
         }
     }

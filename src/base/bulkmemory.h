@@ -10,9 +10,9 @@
 constexpr std::size_t bulkSize = std::size_t{1} << 20; ///< Less is no concern of what follows.
 constexpr std::size_t largePageSize = std::size_t{2} << 20;
 
-/// Throws std::bad_alloc unless, besides `size` bytes, there is what the toolkit needs for a window:
-/// entries may run out of memory, and that is answered where they are read. The toolkit and its
-/// libraries do not survive it.
+/// Throws std::bad_alloc unless, besides `size` bytes, there is what the toolkit needs for a
+/// window: entries may run out of memory, and that is answered where they are read. The toolkit and
+/// its libraries do not survive it.
 inline void leaveMemoryForToolkit(std::size_t size) {
     constexpr std::size_t forToolkit = std::size_t{64} << 20;
     if (size < bulkSize) {
