@@ -1,5 +1,7 @@
 #include "datafiles.h"
 
+#include "platform/process.h"
+
 #include <QDir>
 
 #include <csignal>
@@ -52,6 +54,8 @@ class TestTextFile : public QObject {
     Q_OBJECT
 
 private slots:
+    void initTestCase() { prepareProcess(); }
+
     void init() {
         QDir{TEST_PRODUCT}.removeRecursively();
         QVERIFY(QDir{}.mkpath(TEST_PRODUCT) && mkfifo(fifo.c_str(), 0600) == 0);

@@ -10,20 +10,23 @@
 constexpr std::size_t bulkSize = std::size_t{1} << 20; ///< Less is no concern of what follows.
 constexpr std::size_t largePageSize = std::size_t{2} << 20;
 
+/// Throws std::bad_alloc unless there are `left` bytes of memory beside `size`. Takes none.
+inline void leaveMemoryBeside(std::size_t size, std::size_t left) {
+    void *room =
+        ::mmap(nullptr, size + left, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
+    if (room == MAP_FAILED) {
+        throw std::bad_alloc{};
+    }
+    ::munmap(room, size + left);
+}
+
 /// Throws std::bad_alloc unless, besides `size` bytes, there is what the toolkit needs for a
 /// window: entries may run out of memory, and that is answered where they are read. The toolkit and
 /// its libraries do not survive it.
 inline void leaveMemoryForToolkit(std::size_t size) {
-    constexpr std::size_t forToolkit = std::size_t{64} << 20;
-    if (size < bulkSize) {
-        return;
+    if (size >= bulkSize) {
+        leaveMemoryBeside(size, std::size_t{64} << 20);
     }
-    void *room = ::mmap(nullptr, size + forToolkit, PROT_READ | PROT_WRITE,
-                        MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
-    if (room == MAP_FAILED) {
-        throw std::bad_alloc{};
-    }
-    ::munmap(room, size + forToolkit);
 }
 
 /// Asks the kernel for large pages in the `size` bytes at `begin`, before they are first touched.

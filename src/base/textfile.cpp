@@ -3,7 +3,6 @@
 #include "base/bulkmemory.h"
 
 #include <cerrno>
-#include <csignal>
 #include <fcntl.h>
 #include <sys/resource.h>
 #include <sys/stat.h>
@@ -42,25 +41,6 @@ private:
     }
 
     int number_;
-};
-
-/// Keeps a write past the file size limit, or into a pipe that nobody reads, from ending the
-/// process: the write then fails like any other. What stood before is put back, for the commands
-/// that the program runs inherit it.
-class WriteSignalsIgnored {
-public:
-    WriteSignalsIgnored()
-        : sizeLimit_{std::signal(SIGXFSZ, SIG_IGN)}, pipe_{std::signal(SIGPIPE, SIG_IGN)} {}
-    WriteSignalsIgnored(const WriteSignalsIgnored &) = delete;
-    WriteSignalsIgnored &operator=(const WriteSignalsIgnored &) = delete;
-    ~WriteSignalsIgnored() {
-        std::signal(SIGXFSZ, sizeLimit_);
-        std::signal(SIGPIPE, pipe_);
-    }
-
-private:
-    void (*sizeLimit_)(int);
-    void (*pipe_)(int);
 };
 
 /// Counts the bytes, and writes them once there is a file for them.
@@ -186,7 +166,6 @@ bool rewriteFile(const std::string &path, const std::function<void(ByteSink &)> 
     if (isRegular && !takeRoom(file.number(), status, sink.count())) {
         return false;
     }
-    const WriteSignalsIgnored ignored;
     sink.writeTo(file.number());
     format(sink);
     sink.flush();

@@ -35,7 +35,8 @@ FileRead readWholeFile(const std::string &path);
 /// out while it is measured (std::bad_alloc is passed on), the file keeps what it holds; one that
 /// was missing may be left empty. The second time it must not throw; what takes memory belongs into
 /// the first, or before both. A device that fails on the way leaves new bytes before old ones. When
-/// it returns, the bytes are on the disk, where the file is on one.
+/// it returns, the bytes are on the disk, where the file is on one. The process has to ignore
+/// SIGXFSZ and SIGPIPE; see prepareProcess.
 ///
 /// `newFileMode` is the mode of a file that was missing, less the process's umask.
 bool rewriteFile(const std::string &path, const std::function<void(ByteSink &)> &format,

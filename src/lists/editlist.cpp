@@ -12,6 +12,8 @@
 #include <QLineEdit>
 #include <QScrollArea>
 
+#include <new>
+
 namespace {
 
 constexpr int browseWidth = 60;
@@ -198,8 +200,14 @@ QGroupBox *EditList::newOptions(const maillist_entry &list) {
 }
 
 void EditList::store(maillist_entry &list) {
-    for (const auto &storeWidget : stores_) {
-        storeWidget(list);
+    const maillist_fields before = list;
+    try {
+        for (const auto &storeWidget : stores_) {
+            storeWidget(list);
+        }
+    } catch (const std::bad_alloc &) {
+        static_cast<maillist_fields &>(list) = before;
+        throw;
     }
     list.member = members_->takeChain();
     list.allow = allowed_->takeChain();

@@ -21,7 +21,7 @@ public:
     EditList(QWidget *parent, const char *name, const maillist_entry *list);
 
     /// Hands everything over to the record, the address lists by giving them away; what the editor
-    /// does not edit stays as it is.
+    /// does not edit stays as it is. When memory runs out (std::bad_alloc), all of it does.
     void store(maillist_entry &list);
 
 public slots:

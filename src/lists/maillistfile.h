@@ -47,7 +47,8 @@ constexpr std::uint32_t MAILLIST_REPLY_TO = 8;
 constexpr std::uint32_t MAILLIST_DIGEST = 16;
 constexpr std::uint32_t MAILLIST_BLOCK_MIME = 32;
 
-struct maillist_entry {
+/// A list without its addresses.
+struct maillist_fields {
     KeptText name;
     KeptText post;
     KeptText admin; ///< Where people subscribe.
@@ -62,6 +63,9 @@ struct maillist_entry {
         0; ///< This and the next belong to the mail service: only carried through.
     std::int32_t digcur = 0;
     std::uint32_t flags = 0; ///< MAILLIST_... bits; others are carried through.
+};
+
+struct maillist_entry : maillist_fields {
     AddressChain member;
     AddressChain allow;
     AddressChain block;

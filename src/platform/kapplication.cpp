@@ -1,10 +1,13 @@
 #include "platform/kapplication.h"
 
+#include "base/bulkmemory.h"
+
 #include <QAbstractButton>
 #include <QApplication>
 #include <QDir>
 #include <QKeyEvent>
 #include <QLibraryInfo>
+#include <QScopedValueRollback>
 #include <QThreadPool>
 #include <QTranslator>
 
@@ -14,6 +17,8 @@
 #include <cstdio>
 #include <cstdlib>
 #include <new>
+#include <system_error>
+#include <thread>
 #include <utility>
 #include <vector>
 
@@ -89,9 +94,8 @@ public:
     }
 
     void dropPendingInput() {
-        isDropping_ = true;
+        const QScopedValueRollback dropping{isDropping_, true};
         QGuiApplication::sync();
-        isDropping_ = false;
     }
 
 private:
@@ -116,19 +120,37 @@ private:
     /// Whether a key that is held down would press a button once more. A repetition that reaches a
     /// window just opened is not marked as one: it is a press at the time of the release before.
     bool pressesButtonAgain(QObject *receiver, const QKeyEvent &press) const {
-        const bool isReturn = press.key() == Qt::Key_Return || press.key() == Qt::Key_Enter;
+        const bool isAnyButtons = press.key() == Qt::Key_Return || press.key() == Qt::Key_Enter ||
+                                  press.key() == Qt::Key_Escape;
         const bool isSpaceOnButton =
             press.key() == Qt::Key_Space && qobject_cast<QAbstractButton *>(receiver) != nullptr;
         const bool isRepeated =
             press.isAutoRepeat() || (press.key() == releasedKey_ && press.timestamp() != 0 &&
                                      press.timestamp() == releasedAt_);
-        return isRepeated && (isReturn || isSpaceOnButton);
+        return isRepeated && (isAnyButtons || isSpaceOnButton);
     }
 
     bool isDropping_ = false;
     int releasedKey_ = 0;
     quint64 releasedAt_ = 0; ///< In the display's milliseconds.
 };
+
+/// The toolkit paints large areas in threads of its pool, and would wait for ever for one that
+/// could not be started: one is started here, does, and stays. Throws std::bad_alloc where there is
+/// no memory for it and the first window.
+void startPaintingThread() {
+    constexpr std::size_t forWindow = std::size_t{32} << 20;
+    leaveMemoryBeside(0, forWindow);
+    try {
+        std::thread{[] {}}.join(); // The pool itself does not survive a thread that does not start.
+    } catch (const std::system_error &) {
+        throw std::bad_alloc{};
+    }
+    QThreadPool *pool = QThreadPool::globalInstance();
+    pool->setMaxThreadCount(1);
+    pool->setExpiryTimeout(-1);
+    pool->start([] {});
+}
 
 /// Where the locale lower-cases a letter of the keys in a way of its own, as the Turkish ones do
 /// with I, this thread compares and classifies characters by the C locale's table.
@@ -167,10 +189,7 @@ KApplication::KApplication(const char *program, const char *name, bool hasDispla
         // What the program shows reads from left to right, whatever the toolkit's texts do.
         QGuiApplication::setLayoutDirection(Qt::LeftToRight);
         toolkit_ = std::make_unique<Toolkit>(toolkitArgumentCount_, toolkitArguments_);
-        // The toolkit paints large areas in threads of its pool. It would wait for ever for one
-        // that there is no memory to start, so the first one stays, and does.
-        QThreadPool::globalInstance()->setMaxThreadCount(1);
-        QThreadPool::globalInstance()->setExpiryTimeout(-1);
+        startPaintingThread();
     } else {
         toolkit_ = std::make_unique<QCoreApplication>(toolkitArgumentCount_, toolkitArguments_);
     }

@@ -9,8 +9,11 @@ namespace {
 
 constexpr std::array<int, 3> endSignals{SIGTERM, SIGINT, SIGHUP};
 
+/// A write into a pipe that nobody reads, or past the file size limit, then fails like any other.
+constexpr std::array<int, 2> writeSignals{SIGPIPE, SIGXFSZ};
+
 /// What the process was started with.
-struct sigaction pipeAction {};
+std::array<struct sigaction, writeSignals.size()> startActions{};
 bool isPrepared = false;
 
 std::array<volatile std::sig_atomic_t, endSignals.size()> arrived{};
@@ -37,18 +40,20 @@ void prepareProcess() {
     ::mallopt(M_ARENA_MAX, 1);
     struct sigaction ignore {};
     ignore.sa_handler = SIG_IGN;
-    ::sigaction(SIGPIPE, &ignore, &pipeAction);
+    for (std::size_t index = 0; index < writeSignals.size(); ++index) {
+        ::sigaction(writeSignals.at(index), &ignore, &startActions.at(index));
+    }
     isPrepared = true;
 }
 
 void runShellCommand(const char *command) {
-    struct sigaction now {};
-    if (isPrepared) {
-        ::sigaction(SIGPIPE, &pipeAction, &now);
+    std::array<struct sigaction, writeSignals.size()> now{};
+    for (std::size_t index = 0; isPrepared && index < writeSignals.size(); ++index) {
+        ::sigaction(writeSignals.at(index), &startActions.at(index), &now.at(index));
     }
     [[maybe_unused]] const int status = std::system(command);
-    if (isPrepared) {
-        ::sigaction(SIGPIPE, &now, nullptr);
+    for (std::size_t index = 0; isPrepared && index < writeSignals.size(); ++index) {
+        ::sigaction(writeSignals.at(index), &now.at(index), nullptr);
     }
 }
 

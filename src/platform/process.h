@@ -5,10 +5,10 @@
 
 /// What the process shares with the one that started it: signals, descriptors, commands.
 
-/// To be called before anything is opened. Standard input, output and error become /dev/null where
-/// they are closed: the next file, or the display's connection, would otherwise take their place
-/// and get the program's messages. Output to a pipe that nobody reads ends nothing from here on,
-/// and all threads share one heap.
+/// To be called first. Standard input, output and error become /dev/null where they are closed: the
+/// next file, or the display's connection, would otherwise take their place and get the program's
+/// messages. No write ends the process from here on, neither into a pipe that nobody reads nor past
+/// the file size limit. All threads share one heap.
 void prepareProcess();
 
 /// Runs the command in the shell and waits for its end. It finds the signals as this process found

@@ -95,8 +95,8 @@ void askUntilTaken(QDialog &dialog, Take take) {
 
 /// Asks in a `Dialog` named "Edit" for a new record and adds it, unless that is cancelled: at the
 /// head of its list, with a row at the bottom of the box. `read(owner, &record, &dialog)` takes the
-/// input over; a slot of the owner will do. It must give away what the dialog cannot give twice
-/// only when nothing of it can fail any more.
+/// input over; a slot of the owner will do. It must change nothing, and give nothing away that the
+/// dialog cannot give twice, before all that can fail is done.
 template <class Dialog, class Owner, class Record, class Read, class Shown>
 void addByDialog(Owner *owner, QListBox *box, Record **head, Read read, Shown shown) {
     Dialog dialog{owner, "Edit", nullptr};

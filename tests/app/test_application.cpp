@@ -144,17 +144,22 @@ private slots:
     void heldKeyPressesAButtonOnce() {
         tabs()->setCurrentIndex(5);
         auto *add = captioned(page("alias"), &QAbstractButton::text, "Add...");
-        for (const bool isMarked : {true, false}) {
-            QKeyEvent release{QEvent::KeyRelease, Qt::Key_Return, {}};
-            QKeyEvent again{QEvent::KeyPress, Qt::Key_Return, {}, {}, isMarked};
+        for (const auto &[key, isMarked] : {std::pair{Qt::Key_Return, true},
+                                            {Qt::Key_Return, false},
+                                            {Qt::Key_Space, false},
+                                            {Qt::Key_Escape, true}}) {
+            QKeyEvent release{QEvent::KeyRelease, key, {}};
+            QKeyEvent again{QEvent::KeyPress, key, {}, {}, isMarked};
             release.setTimestamp(5);
             again.setTimestamp(isMarked ? 6 : 5);
             QVERIFY(!withDialog(
                 [&] {
                     QApplication::sendEvent(add, &release);
                     QApplication::sendEvent(add, &again);
+                    QApplication::sendEvent(add, &release);
                 },
                 [](QWidget *dialog) { dialog->close(); }));
+            QVERIFY(mainDialog()->isVisible());
         }
         QVERIFY(withDialog([&] { QTest::keyClick(add, Qt::Key_Return); },
                            [](QWidget *dialog) { dialog->close(); }));
