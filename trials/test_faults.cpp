@@ -102,6 +102,7 @@ struct Program : QProcess {
         waitForFinished();
         ::close(line);
     }
+    static constexpr int hangs = 999; ///< In place of a status.
     /// The next letter that it says; "-" once it is gone, "?" when it hangs.
     [[nodiscard]] char heard(int patience = 60'000) const {
         char letter = '-';
@@ -114,7 +115,7 @@ struct Program : QProcess {
     /// The exit status, or the signal that ended it as a negative number.
     int end() {
         const bool isEnded = waitForFinished(60'000);
-        return isEnded ? exitCode() * (exitStatus() == CrashExit ? -1 : 1) : 999;
+        return isEnded ? exitCode() * (exitStatus() == CrashExit ? -1 : 1) : hangs;
     }
     void limit(__rlimit_resource resource, rlim_t most) const {
         const rlimit bound{most, RLIM_INFINITY};
@@ -358,11 +359,19 @@ private slots:
         }
         lay();
         for (rlim_t most = 256 << 20; !withSanitizer && most > 32 << 20; most -= most / 16) {
-            Program init({"-init"}, [bound = rlimit{most, most}] { setrlimit(RLIMIT_AS, &bound); });
+            const auto limited = [bound = rlimit{most, most}] { setrlimit(RLIMIT_AS, &bound); };
+            Program init({"-init"}, limited);
             const bool isLoaded = init.heard() == 'h'; // Otherwise its libraries have no room.
             QVERIFY2(init.end() == 0 || !isLoaded, std::to_string(most).c_str());
+            QCOMPARE(state(), "0000");
+            Program window({}, limited); // Works, or ends with a word.
+            const bool isShown = window.isReady();
+            const int status = isShown ? 0 : window.end();
+            QVERIFY2(isShown ? window.applies() : status > 0 && status < Program::hangs,
+                     std::to_string(most).c_str());
+            QVERIFY2(state().find_first_of("23") == std::string::npos, state().c_str());
+            lay();
         }
-        QCOMPARE(state(), "0000");
     }
 
     void signalsCutNothing() {
