@@ -200,13 +200,14 @@ QGroupBox *EditList::newOptions(const maillist_entry &list) {
 }
 
 void EditList::store(maillist_entry &list) {
-    const maillist_fields before = list;
+    maillist_fields &fields = list;
+    const maillist_fields before = fields;
     try {
         for (const auto &storeWidget : stores_) {
             storeWidget(list);
         }
     } catch (const std::bad_alloc &) {
-        static_cast<maillist_fields &>(list) = before;
+        fields = before;
         throw;
     }
     list.member = members_->takeChain();
