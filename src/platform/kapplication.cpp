@@ -16,6 +16,8 @@
 #include <clocale>
 #include <cstdio>
 #include <cstdlib>
+#include <latch>
+#include <memory>
 #include <new>
 #include <system_error>
 #include <thread>
@@ -136,10 +138,11 @@ private:
 };
 
 /// The toolkit paints large areas in threads of its pool, and would wait for ever for one that
-/// could not be started: one is started here, does, and stays. Throws std::bad_alloc where there is
-/// no memory for it and the first window.
-void startPaintingThread() {
-    constexpr std::size_t forWindow = std::size_t{32} << 20;
+/// could not be started: they are started here, and stay. Throws std::bad_alloc where there is no
+/// memory for them and the first window.
+void startPaintingThreads() {
+    constexpr int count = 2; // One alone would make the start longer by some milliseconds.
+    constexpr std::size_t forWindow = std::size_t{48} << 20; // With two stacks of the usual 8 MB.
     leaveMemoryBeside(0, forWindow);
     try {
         std::thread{[] {}}.join(); // The pool itself does not survive a thread that does not start.
@@ -147,9 +150,13 @@ void startPaintingThread() {
         throw std::bad_alloc{};
     }
     QThreadPool *pool = QThreadPool::globalInstance();
-    pool->setMaxThreadCount(1);
+    pool->setMaxThreadCount(count);
     pool->setExpiryTimeout(-1);
-    pool->start([] {});
+    // Each waits for the other, so that each takes a thread of its own.
+    const auto running = std::make_shared<std::latch>(count);
+    for (int index = 0; index < count; ++index) {
+        pool->start([running] { running->arrive_and_wait(); });
+    }
 }
 
 /// Where the locale lower-cases a letter of the keys in a way of its own, as the Turkish ones do
@@ -189,7 +196,7 @@ KApplication::KApplication(const char *program, const char *name, bool hasDispla
         // What the program shows reads from left to right, whatever the toolkit's texts do.
         QGuiApplication::setLayoutDirection(Qt::LeftToRight);
         toolkit_ = std::make_unique<Toolkit>(toolkitArgumentCount_, toolkitArguments_);
-        startPaintingThread();
+        startPaintingThreads();
     } else {
         toolkit_ = std::make_unique<QCoreApplication>(toolkitArgumentCount_, toolkitArguments_);
     }
