@@ -227,6 +227,9 @@ void pathsAreSet() {
 void pass(const std::string &path) {
     FILE *from = std::fopen(path.c_str(), "r");
     FILE *to = std::fopen((product + "/copy").c_str(), "w");
+    if (from == nullptr || to == nullptr) {
+        std::abort();
+    }
     std::array<char, 4096> line{};
     while (std::fgets(line.data(), line.size(), from) != nullptr) {
         std::fputs(line.data(), to);
@@ -302,8 +305,8 @@ void measureStart() {
             rewriteFile(formats().at(format).path, formats().at(format).file(million));
         }
     };
-    const Cost cost = costOf(
-        prepare, [] { session(false); }, 3);
+    const auto startAndEnd = [] { session(false); };
+    const Cost cost = costOf(prepare, startAndEnd, 3);
     print("start and end with a million in each of the three files", cost.milliseconds, "ms", 500);
     print("its memory", cost.megabytes, "MB", 462);
 }

@@ -124,7 +124,7 @@ private slots:
             [](const std::string &bytes) {
                 std::string text;
                 for (const maillist_addr_entry &address : parseAddressLines(bytes)) {
-                    text = "<"s + address.addr + ">" + text; // The file's last is the first.
+                    text.insert(0, "<"s + address.addr + ">"); // The file's last is the first.
                 }
                 return text;
             },

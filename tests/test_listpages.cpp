@@ -56,7 +56,7 @@ QListBox *boxIn(const QWidget *window) { return window->findChild<QListBox *>();
 
 /// Opens the dialog of the first row.
 template <class Use>
-void withFirst(const QWidget *window, Use use) {
+void withFirst(const QWidget *window, const Use &use) {
     QVERIFY(withDialog([&] { doubleClickRow(boxIn(window), 0); }, use));
 }
 
@@ -143,30 +143,32 @@ private slots:
     }
 
     void aliasTargets() {
-        using Case = std::array<const char *, 5>;
-        for (const auto &[line, type, chosen, closing, after] :
+        struct Case {
+            const char *line, *type, *chosen, *closing, *after;
+        };
+        for (const Case &row :
              {Case{"a,!ann,cy\n", "Address", "Mailing List Admin", "OK", "a,new@x,!#bob\n"},
               {"a,#ann,cy\n", "Mailing List Admin", "Address", "OK", "a,new@x,bob\n"},
               {"a,!#ann,cy\n", "Mailing List Admin", "Auto Responder", "OK", "a,new@x,!#bob\n"},
               {"a,#$ann,cy\n", "Mailing List Admin", "Address", "Cancel", "a,#$ann,cy\n"},
               {"a,$n,cy\n", "Mailing List Posting", "External Task", "OK", "a,new@x,bob\n"}}) {
             alias_list.clear();
-            parseAliases(keep(line), alias_list);
+            parseAliases(keep(row.line), alias_list);
             withFirst(shownPage<MailAlias>().get(), [&](QWidget *dialog) {
                 withFirst(dialog, [&](QWidget *target) {
                     auto *types = fieldBeside<QComboBox>(target, "Alias Type:");
-                    QCOMPARE(types->currentText(), type);
-                    types->setCurrentText(chosen);
+                    QCOMPARE(types->currentText(), row.type);
+                    types->setCurrentText(row.chosen);
                     answer("&Alias:", "bob")(target);
                 });
                 act(dialog, "Add...", "&Alias:", "new@x");
                 boxIn(dialog)->setCurrentRow(1);
                 press(dialog, "Remove");
                 QCOMPARE(rowsOf(boxIn(dialog)), "bob|new@x");
-                QCOMPARE(whole(formatAliases, alias_list), line);
-                press(dialog, closing);
+                QCOMPARE(whole(formatAliases, alias_list), row.line);
+                press(dialog, row.closing);
             });
-            QCOMPARE(whole(formatAliases, alias_list), after);
+            QCOMPARE(whole(formatAliases, alias_list), row.after);
         }
     }
 
@@ -284,10 +286,11 @@ private slots:
             auto *button = captioned(dialog, &QWidget::accessibleName, caption + " Browse...");
             field->setText(folder.path());
             for (const bool isAccepted : {false, true}) {
-                const auto choose = [&](QFileDialog *chooser) {
-                    QCOMPARE(chooser->objectName(), name);
+                const auto choose = [&, kind = name,
+                                     path = folder.filePath(chosen)](QFileDialog *chooser) {
+                    QCOMPARE(chooser->objectName(), kind);
                     QVERIFY(chooser->directory().path().startsWith(folder.path()));
-                    chooser->selectFile(folder.filePath(chosen));
+                    chooser->selectFile(path);
                     static_cast<QDialog *>(chooser)->done(isAccepted ? 1 : 0);
                 };
                 QVERIFY(withDialog<QFileDialog>(

@@ -60,13 +60,13 @@ private slots:
         for (const auto &[page, server] :
              {Server{newPage<MailSMTP>, "smtp"}, Server{newPage<MailPOP3>, "pop"},
               Server{newPage<MailIMAP>, "imap"}}) {
-            cases.push_back({page, server + ".sock.enabled", "Enable server", nullptr, "no"});
-            cases.push_back({page, server + ".sock.port", "&Port:", "65535", "65535"});
-            cases.push_back({page, server + ".sock.timeout", "&Timeout (secs):", "999", "999"});
-            cases.push_back({page, server + ".sock.max", "&Max Connections:", "0", "0"});
-            cases.push_back({page, server + ".allow", "&Allow Access:", "x,ALL", "all"});
-            cases.push_back(
-                {page, server + ".block", "&Block Access:", "10.0.0.0/8", "10.0.0.0/8"});
+            cases.insert(cases.end(),
+                         {{page, server + ".sock.enabled", "Enable server", nullptr, "no"},
+                          {page, server + ".sock.port", "&Port:", "65535", "65535"},
+                          {page, server + ".sock.timeout", "&Timeout (secs):", "999", "999"},
+                          {page, server + ".sock.max", "&Max Connections:", "0", "0"},
+                          {page, server + ".allow", "&Allow Access:", "x,ALL", "all"},
+                          {page, server + ".block", "&Block Access:", "10.0.0.0/8", "10.0.0.0/8"}});
         }
         for (const auto &[make, key, caption, typed, value] : cases) {
             auto values = allValues();

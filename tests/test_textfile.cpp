@@ -36,18 +36,18 @@ std::string cut(std::string_view bytes, std::size_t longest) {
 
 // Of these two the program finds the test's rather than the C library's.
 
-int fallocate(int number, int mode, off_t from, off_t length) {
+int fallocate(int fd, int mode, off_t offset, off_t len) {
     errno = failing.fallocateError;
-    return errno != 0 ? -1 : static_cast<int>(syscall(SYS_fallocate, number, mode, from, length));
+    return errno != 0 ? -1 : static_cast<int>(syscall(SYS_fallocate, fd, mode, offset, len));
 }
 
-ssize_t write(int number, const void *bytes, std::size_t size) {
+ssize_t write(int fd, const void *buf, std::size_t n) {
     if (failing.writesLeft == 0) {
         errno = EIO;
         return -1;
     }
     failing.writesLeft -= failing.writesLeft > 0 ? 1 : 0;
-    return syscall(SYS_write, number, bytes, size);
+    return syscall(SYS_write, fd, buf, n);
 }
 
 class TestTextFile : public QObject {
@@ -91,10 +91,10 @@ private slots:
         const std::string link = folder + "/link";
         QVERIFY(rewriteFile(file, "a longer text") && chmod(file.c_str(), 0640) == 0);
         QCOMPARE(symlink("file", link.c_str()), 0);
-        struct stat before {};
+        struct stat before = {};
         QCOMPARE(stat(file.c_str(), &before), 0);
         QVERIFY(rewriteFile(link, "short") && bytesAt(file) == "short");
-        struct stat after {};
+        struct stat after = {};
         QCOMPARE(stat(file.c_str(), &after), 0);
         QVERIFY(after.st_ino == before.st_ino && after.st_mode == before.st_mode);
     }

@@ -251,7 +251,7 @@ private slots:
                 QVERIFY(tip != nullptr);
                 QVERIFY(!tip->geometry().intersects(window->geometry()));
                 QToolTip::hideText();
-                QTRY_VERIFY(tip == nullptr || !tip->isVisible());
+                QVERIFY(QTest::qWaitFor([&] { return tip == nullptr || !tip->isVisible(); }));
             }
         }
     }

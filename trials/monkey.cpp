@@ -138,7 +138,7 @@ int below(qsizetype limit) { return static_cast<int>(source() % static_cast<unsi
 void note(const char *what, const QWidget *where, const QString &more) {
     sent << where->window()->windowTitle() + ": " + what + ' ' + where->metaObject()->className() +
                 ' ' + more.left(40).simplified();
-    trace << qPrintable(sent.back()) << std::endl;
+    trace << qPrintable(sent.back()) << '\n' << std::flush;
 }
 
 /// It could change other files: it gets no other events.

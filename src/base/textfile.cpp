@@ -32,7 +32,7 @@ private:
         // holds a lease on would fail here as well; it is worth the wait until the lease is given
         // up.
         const int number = ::open(path, flags | O_NONBLOCK, newFileMode);
-        struct stat status {};
+        struct stat status = {};
         if (number < 0 && errno == EWOULDBLOCK && ::stat(path, &status) == 0 &&
             S_ISREG(status.st_mode)) {
             return ::open(path, flags, newFileMode);
@@ -75,14 +75,14 @@ private:
 
 /// Whether the file system says that it has room for `size` bytes more; some say nothing.
 bool hasFreeSpace(int file, std::size_t size) {
-    struct statvfs system {};
+    struct statvfs system = {};
     return ::fstatvfs(file, &system) != 0 || system.f_blocks == 0 ||
            system.f_bavail * system.f_frsize >= size;
 }
 
 /// Gives back what room the file has behind its end.
 void giveRoomBack(int file) {
-    struct stat status {};
+    struct stat status = {};
     if (::fstat(file, &status) == 0) {
         [[maybe_unused]] const int result = ::ftruncate(file, status.st_size);
     }
@@ -122,7 +122,7 @@ FileRead readWholeFile(const std::string &path) {
     if (!file.isOpen()) {
         return {std::nullopt, errno == ENOENT};
     }
-    struct stat status {};
+    struct stat status = {};
     if (::fstat(file.number(), &status) != 0 || !S_ISREG(status.st_mode)) {
         return {};
     }
@@ -158,7 +158,7 @@ bool rewriteFile(const std::string &path, const std::function<void(ByteSink &)> 
     format(sink);
     sink.flush();
     const FileDescriptor file{path, O_WRONLY | O_CREAT, newFileMode};
-    struct stat status {};
+    struct stat status = {};
     if (!file.isOpen() || ::fstat(file.number(), &status) != 0) {
         return false;
     }

@@ -189,8 +189,8 @@ void KLocale::open(const QString &name, const QString &directory) {
     bind_textdomain_codeset(domain_.c_str(), "UTF-8");
 }
 
-KApplication::KApplication(const char *program, const char *name, bool hasDisplay)
-    : toolkitArguments_{const_cast<char *>(program), nullptr} {
+KApplication::KApplication(const char *program, const char *name, bool hasDisplay) {
+    toolkitArguments_[0] = const_cast<char *>(program);
     if (hasDisplay) {
         const DisplayProblems problems{name};
         // What the program shows reads from left to right, whatever the toolkit's texts do.

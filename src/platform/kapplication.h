@@ -71,7 +71,7 @@ public:
 private:
     // The toolkit keeps references to both. No argument reaches it: all are the application's own.
     int toolkitArgumentCount_ = 1;
-    char *toolkitArguments_[2];
+    char *toolkitArguments_[2]{};
     std::unique_ptr<QCoreApplication> toolkit_;
     std::unique_ptr<QTranslator> toolkitTexts_; ///< Null in the toolkit's own language.
 };

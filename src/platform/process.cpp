@@ -38,7 +38,7 @@ void prepareProcess() {
     }
     // A heap for each of the toolkit's threads would set aside 128 MB of address space for itself.
     ::mallopt(M_ARENA_MAX, 1);
-    struct sigaction ignore {};
+    struct sigaction ignore = {};
     ignore.sa_handler = SIG_IGN;
     for (std::size_t index = 0; index < writeSignals.size(); ++index) {
         ::sigaction(writeSignals.at(index), &ignore, &startActions.at(index));
@@ -61,7 +61,7 @@ void runShellCommand(const char *command) {
 // is caught instead, whichever thread gets it.
 
 EndSignalsHeld::EndSignalsHeld() {
-    struct sigaction caught {};
+    struct sigaction caught = {};
     caught.sa_handler = hold;
     caught.sa_flags = SA_RESTART;
     for (std::size_t index = 0; index < endSignals.size(); ++index) {

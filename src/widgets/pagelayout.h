@@ -13,7 +13,7 @@ constexpr int spaceAboveFirstRow = 10;
 
 /// Whether borders, spacings and rows grow lower where the window is too low for all of them, each
 /// by its share of what is missing.
-enum class Shrinking { No, Yes };
+enum class Shrinking : bool { No, Yes };
 
 inline void addSpace(QVBoxLayout *layout, int height, Shrinking shrinking) {
     layout->addItem(
