@@ -4,7 +4,7 @@
 #include "lists/editlistmember.h"
 #include "lists/maillistfile.h"
 #include "platform/knumericspinbox.h"
-#include "widgets/fieldtext.h"
+#include "widgets/textfield.h"
 
 #include "datafiles.h"
 #include "dialogdriver.h"
@@ -23,13 +23,13 @@ template <class NewField>
 std::string pasted(const std::string &row, NewField newField) {
     const QStringList parts = textFromBytes(row).replace('>', '<').split('<');
     const KeptText stored = keep(bytesFromText(parts.at(0) + parts.at(2)));
-    QLineEdit *field = newField(stored);
-    if (fieldText(field, stored).data() != stored.data()) {
+    TextField *field = newField(stored);
+    if (field->keptText(stored).data() != stored.data()) {
         return "not the stored text again";
     }
     field->setCursorPosition(static_cast<int>(parts.at(0).size()));
     paste(field, parts.at(1));
-    return (field->isReadOnly() ? "read-only: " : "") + fieldText(field, stored);
+    return (field->isReadOnly() ? "read-only: " : "") + field->keptText(stored);
 }
 
 /// Whether the dialog closes on a text that came neither from keys nor from the clipboard.
@@ -71,10 +71,10 @@ private slots:
     void pasting() {
         checkRows(
             [](const std::string &row) {
-                const std::unique_ptr<QLineEdit> field{newField(nullptr)};
+                TextField field{nullptr};
                 return pasted(row, [&](KeptText stored) {
-                    showBytes(field.get(), stored);
-                    return field.get();
+                    field.showBytes(stored);
+                    return &field;
                 });
             },
             "[pasting into a field]");
@@ -87,7 +87,7 @@ private slots:
                 setPopHostText(host.user, stored);
                 setPopHostText(host.password, stored);
                 dialog.emplace(nullptr, "edit", &host);
-                return fieldBeside(&*dialog, caption);
+                return fieldBeside<TextField>(&*dialog, caption);
             };
             checkRows([&](const std::string &row) { return pasted(row, inDialog); },
                       ('[' + std::string{caption} + ']').c_str());
@@ -96,7 +96,7 @@ private slots:
         const auto asMember = [&member](KeptText stored) {
             const maillist_addr_entry entry{stored};
             member.emplace(nullptr, "edit", &entry);
-            return fieldBeside(&*member, "&Email:");
+            return fieldBeside<TextField>(&*member, "&Email:");
         };
         checkRows([&](const std::string &row) { return pasted(row, asMember); }, "[&Email:]");
     }

@@ -15,7 +15,11 @@ struct Window : QObject {
     explicit Window(int current,
                     const std::vector<std::string_view> &rows = {"a", "b", "c", "d", "e"}) {
         box->resize(200, 300);
-        box->append(rows);
+        std::vector<KeptText> texts;
+        for (const std::string_view row : rows) {
+            texts.push_back(keep(row));
+        }
+        box->append(texts);
         ok->setDefault(true);
         QObject::connect(ok, &QPushButton::clicked, &dialog, &QDialog::accept);
         QObject::connect(box, &QListBox::selected,
@@ -91,7 +95,7 @@ private slots:
 
     void addedRowIsSeenButNotChosen() {
         Window window{0, std::vector<std::string_view>(100, "x")};
-        window.box->append("new");
+        window.box->append(keep("new"));
         QVERIFY(window.box->viewport()->rect().contains(centreOfRow(window.box, 100)));
         QCOMPARE(window.current(), "0");
     }
@@ -102,7 +106,7 @@ private slots:
         QCoreApplication::processEvents();
         window.box->viewport()->installEventFilter(&window);
         window.isPainted = false;
-        window.box->changeText(2, "changed");
+        window.box->changeText(2, keep("changed"));
         QVERIFY(QTest::qWaitFor([&] { return window.isPainted; }));
     }
 

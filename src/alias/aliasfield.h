@@ -1,14 +1,12 @@
 #pragma once
 
-#include "widgets/fieldrule.h"
+#include "widgets/textfield.h"
 
 /// What an address and a target may not hold, because the file would split them there or skip it
 /// before them. NUL would become a blank.
 inline FieldRule oneWordRule() {
-    return {QStringLiteral(" \t,\r\n\v\f") + QChar(u'\0'),
-            {},
-            0,
-            QStringLiteral("One word, without blanks and commas")};
+    return {.refused = QStringLiteral(" \t,\r\n\v\f") + QChar(u'\0'),
+            .toolTip = QStringLiteral("One word, without blanks and commas")};
 }
 
 /// The same for what a line begins with: the file skips lines that begin with these.

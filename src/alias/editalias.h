@@ -2,9 +2,10 @@
 
 #include "alias/aliasfile.h"
 #include "widgets/formdialog.h"
+#include "widgets/listgroup.h"
+#include "widgets/recordrows.h"
 
 class EditAliasEntry;
-class QListBox;
 
 /// Edits one alias: its address, and a working list of its targets. The alias itself stays as it is
 /// until who opened the dialog takes both over.
@@ -28,7 +29,8 @@ public slots:
     void Read(alias_list_entry *target, EditAliasEntry *dialog);
 
 private:
-    QLineEdit *address_;
-    QListBox *box_;
-    RecordChain<alias_list_entry> targets_;
+    TextField *address_;
+    RecordChain<alias_list_entry> targets_; ///< The working list.
+    ListGroup *group_;
+    RecordRows<EditAlias, alias_list_entry, EditAliasEntry> targetRows_;
 };

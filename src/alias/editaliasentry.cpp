@@ -2,12 +2,11 @@
 
 #include "alias/aliasfield.h"
 #include "alias/aliasfile.h"
-#include "widgets/fieldtext.h"
+#include "widgets/textfield.h"
 
 #include <QComboBox>
 #include <QHBoxLayout>
 #include <QLabel>
-#include <QLineEdit>
 #include <QPushButton>
 
 #include <array>
@@ -44,12 +43,12 @@ EditAliasEntry::EditAliasEntry(QWidget *parent, const char *name, const alias_li
     CaptionColumn aliasCaption{{40, 18}};
     alias_ = addField(aliasRow, translatable("&Alias:"), aliasCaption,
                       target != nullptr ? target->alias : KeptText{});
-    applyRule(alias_, oneWordRule());
-    connect(addBrowseButton(aliasRow, 70, translatable("&Alias:")), &QPushButton::clicked, this,
-            &EditAliasEntry::browse);
+    alias_->setRule(oneWordRule());
+    connect(addBrowseButton(aliasRow, 70, translatable("&Alias:"), alias_), &QPushButton::clicked,
+            this, &EditAliasEntry::browse);
 
-    type_ =
-        new QComboBox(this); // Behind the field, so that Tab and the first focus go there first.
+    // Behind the field, so that Tab and the first focus go there first.
+    type_ = new QComboBox(this);
     type_->setObjectName("Alias Type");
     for (const TypeEntry &entry : typeEntries) {
         type_->addItem(QString::fromUtf8(entry.caption));
@@ -66,7 +65,7 @@ EditAliasEntry::EditAliasEntry(QWidget *parent, const char *name, const alias_li
 }
 
 void EditAliasEntry::store(alias_list_entry &target) const {
-    target.alias = fieldText(alias_, target.alias);
+    target.alias = alias_->keptText(target.alias);
     const auto &entry = typeEntries.at(static_cast<std::size_t>(type_->currentIndex()));
     target.type = entry.type.value_or(target.type);
 }

@@ -2,8 +2,6 @@
 
 #include "widgets/formdialog.h"
 
-#include <string>
-
 class QComboBox;
 struct alias_list_entry;
 
@@ -23,6 +21,6 @@ public slots:
     void browse();
 
 private:
-    QLineEdit *alias_;
+    TextField *alias_;
     QComboBox *type_;
 };

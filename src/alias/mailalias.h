@@ -1,10 +1,11 @@
 #pragma once
 
+#include "alias/aliasfile.h"
 #include "platform/kconfigwidget.h"
+#include "widgets/listgroup.h"
+#include "widgets/recordrows.h"
 
 class EditAlias;
-class QListBox;
-struct alias_entry;
 
 /// The page of the aliases. They are edited in place.
 class MailAlias : public KConfigWidget {
@@ -24,5 +25,6 @@ public slots:
     void MailAliasRead(alias_entry *alias, EditAlias *dialog);
 
 private:
-    QListBox *aliases_;
+    ListGroup *group_;
+    RecordRows<MailAlias, alias_entry, EditAlias> aliases_;
 };

@@ -17,6 +17,7 @@
 #include "server/mailsmtp.h"
 #include "server/smtprejectfile.h"
 
+#include <array>
 #include <new>
 
 namespace {
@@ -40,25 +41,54 @@ void writeFiles(bool areSettingsStored) {
     }
 }
 
+template <class Page>
+KConfigWidget *newPage(QWidget *parent, const char *name) {
+    return new Page(parent, name);
+}
+
+struct PageRow {
+    KConfigWidget *(*newPage)(QWidget *parent, const char *name);
+    const char *name;
+    const char *label;
+    const char *helpFile;
+};
+
+/// In the order of the tabs.
+constexpr std::array<PageRow, 7> pageRows{
+    {{newPage<MailSMTP>, "smtpserver", "&SMTP", "tarvex-mail-smtp.html"},
+     {newPage<MailPOP3>, "pop3server", "&POP3", "tarvex-mail-pop3.html"},
+     {newPage<MailIMAP>, "imapserver", "&IMAP", "tarvex-mail-imap.html"},
+     {newPage<MailFetch>, "fetch", "Fetchers", "tarvex-mail-fetchers.html"},
+     {newPage<MailDebatch>, "debatch", "&Delivery", "tarvex-mail-delivery.html"},
+     {newPage<MailAlias>, "alias", "&Aliasing", "tarvex-mail-alias.html"},
+     {newPage<MailList>, "list", "&Mail List", "tarvex-mail-list.html"}}};
+
+/// Delivery stores before the fetchers, unlike the order of the tabs.
+constexpr std::array<std::size_t, pageRows.size()> storeOrder{0, 1, 2, 4, 3, 5, 6};
+
+std::vector<const char *> pageNames() {
+    std::vector<const char *> names;
+    for (const PageRow &row : pageRows) {
+        names.push_back(row.name);
+    }
+    return names;
+}
+
 } // namespace
 
 KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
-    : KControlApplication{
-          argc,
-          argv,
-          name,
-          {"smtpserver", "pop3server", "imapserver", "fetch", "debatch", "alias", "list"}} {
+    : KControlApplication{argc, argv, name, pageNames()} {
     readFiles();
     if (isInitOnly()) {
         return;
     }
-    createPage(smtp_, "smtpserver", "&SMTP", "tarvex-mail-smtp.html");
-    createPage(pop3_, "pop3server", "&POP3", "tarvex-mail-pop3.html");
-    createPage(imap_, "imapserver", "&IMAP", "tarvex-mail-imap.html");
-    createPage(fetch_, "fetch", "Fetchers", "tarvex-mail-fetchers.html");
-    createPage(delivery_, "debatch", "&Delivery", "tarvex-mail-delivery.html");
-    createPage(alias_, "alias", "&Aliasing", "tarvex-mail-alias.html");
-    createPage(lists_, "list", "&Mail List", "tarvex-mail-list.html");
+    for (std::size_t index = 0; index < pageRows.size(); ++index) {
+        const PageRow &row = pageRows.at(index);
+        if (isPageRequested(row.name)) {
+            pages_.at(index) = row.newPage(dialog(), row.name);
+            addPage(pages_.at(index), row.label, row.helpFile);
+        }
+    }
     if (!mayRewrite(productPaths().master)) {
         setNote(getLocale()->translate(
             translatable("Changes cannot be saved: this user may not write the master file.")));
@@ -67,12 +97,10 @@ KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
 }
 
 void KTarvexApplication::applyChanges() {
-    // Delivery stores before the fetchers, unlike the order of the tabs.
     bool areSettingsStored = true;
-    for (KConfigWidget *page : std::initializer_list<KConfigWidget *>{
-             smtp_, pop3_, imap_, delivery_, fetch_, alias_, lists_}) {
+    for (const std::size_t index : storeOrder) {
         try {
-            if (page != nullptr) {
+            if (KConfigWidget *page = pages_.at(index)) {
                 page->storeValues();
             }
         } catch (const std::bad_alloc &) { // What a page could not store is still in its fields.
@@ -82,13 +110,4 @@ void KTarvexApplication::applyChanges() {
     writeFiles(areSettingsStored);
     // What the command reports is its own business; the files are written whatever it says.
     runShellCommand(productPaths().reconfigureCommand);
-}
-
-template <class Page>
-void KTarvexApplication::createPage(Page *&page, const char *name, const char *label,
-                                    const char *helpFile) {
-    if (isPageRequested(name)) {
-        page = new Page(dialog(), name);
-        addPage(page, label, helpFile);
-    }
 }

@@ -2,13 +2,9 @@
 
 #include "platform/kcontrolapplication.h"
 
-class MailAlias;
-class MailDebatch;
-class MailFetch;
-class MailIMAP;
-class MailList;
-class MailPOP3;
-class MailSMTP;
+#include <array>
+
+class KConfigWidget;
 
 /// Reads the product's files, shows the seven pages on them, and writes the files on apply.
 class KTarvexApplication : public KControlApplication {
@@ -20,16 +16,7 @@ public:
     void applyChanges() override;
 
 private:
-    template <class Page>
-    void createPage(Page *&page, const char *name, const char *label, const char *helpFile);
-
-    // Null until created, and for good when the command line names other pages. The dialog owns
-    // them.
-    MailSMTP *smtp_ = nullptr;
-    MailPOP3 *pop3_ = nullptr;
-    MailIMAP *imap_ = nullptr;
-    MailFetch *fetch_ = nullptr;
-    MailDebatch *delivery_ = nullptr;
-    MailAlias *alias_ = nullptr;
-    MailList *lists_ = nullptr;
+    // In the order of the tabs. Null until created, and for good when the command line names other
+    // pages. The dialog owns them.
+    std::array<KConfigWidget *, 7> pages_{};
 };

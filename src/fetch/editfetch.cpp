@@ -1,20 +1,17 @@
 #include "fetch/editfetch.h"
 
 #include "fetch/pophosts.h"
-#include "widgets/fieldrule.h"
-#include "widgets/fieldtext.h"
-
-#include <QLineEdit>
+#include "widgets/textfield.h"
 
 namespace {
 
 /// A field for an array of `size` bytes.
 FieldRule ruleFor(std::size_t size) {
-    const auto mostBytes = static_cast<qsizetype>(size) - 1;
-    return {QStringLiteral(":@,"),
-            {},
-            mostBytes,
-            QStringLiteral("At most %1 bytes, without \":\", \"@\" and \",\"").arg(mostBytes)};
+    const std::size_t maximum = size - 1;
+    return {.refused = QStringLiteral(":@,"),
+            .maximumBytes = maximum,
+            .toolTip =
+                QStringLiteral("At most %1 bytes, without \":\", \"@\" and \",\"").arg(maximum)};
 }
 
 } // namespace
@@ -30,19 +27,19 @@ EditFetch::EditFetch(QWidget *parent, const char *name, const pop_host *host)
     addButtons(pageBorder, 15);
     fixSize({250, 140}, {247, 110});
 
-    applyRule(server_, ruleFor(shown.server.size()));
-    applyRule(password_, ruleFor(shown.password.size()));
+    server_->setRule(ruleFor(shown.server.size()));
+    password_->setRule(ruleFor(shown.password.size()));
     FieldRule userRule = ruleFor(shown.user.size());
     // A new entry stands without a prefix at the beginning of a line, where these have a meaning of
     // their own or, like white space, are dropped.
     userRule.refusedFirst = QStringLiteral("-*%| \t\r\n") + QChar(u'\0');
     userRule.toolTip +=
         QStringLiteral("; not beginning with \"-\", \"*\", \"%\", \"|\" or a blank");
-    applyRule(user_, userRule);
+    user_->setRule(userRule);
 }
 
-std::string EditFetch::server() const { return fieldBytes(server_); }
+std::string EditFetch::server() const { return server_->bytes(); }
 
-std::string EditFetch::user() const { return fieldBytes(user_); }
+std::string EditFetch::user() const { return user_->bytes(); }
 
-std::string EditFetch::password() const { return fieldBytes(password_); }
+std::string EditFetch::password() const { return password_->bytes(); }

@@ -19,7 +19,7 @@ public:
     [[nodiscard]] std::string password() const;
 
 private:
-    QLineEdit *server_;
-    QLineEdit *user_;
-    QLineEdit *password_;
+    TextField *server_;
+    TextField *user_;
+    TextField *password_;
 };

@@ -2,12 +2,9 @@
 
 #include "config/settings.h"
 #include "fetch/editfetch.h"
-#include "fetch/pophosts.h"
 #include "platform/knumericspinbox.h"
-#include "widgets/listgroup.h"
 #include "widgets/numberfield.h"
 #include "widgets/pagelayout.h"
-#include "widgets/recordrows.h"
 
 #include <QLabel>
 
@@ -22,22 +19,24 @@ std::string_view shown(const pop_host &host) { return popHostText(host.user); }
 
 MailFetch::MailFetch(QWidget *parent, const char *name)
     : KConfigWidget(parent, name),
+      group_{new ListGroup("POP3 Mail Fetchers", {600, columnWidth}, this)},
+      fetchers_{this, group_->box(), &pop_host_list.head, shown, &MailFetch::MailFetchRead},
       pollTime_{newNumberField(nullptr, 0, 999, settings().pop_time.value)} {
-    auto *group = new ListGroup("POP3 Mail Fetchers", {600, columnWidth}, this);
-    fetchers_ = group->box();
-    appendRows(fetchers_, pop_host_list, shown);
-    group->addEditButtons(this, &MailFetch::MailFetchAdd, &MailFetch::MailFetchModify,
-                          &MailFetch::MailFetchRemove, &MailFetch::MailFetchSelected);
+    fetchers_.fill();
+    group_->addEditButtons<MailFetch>(this, {.add = &MailFetch::MailFetchAdd,
+                                             .modify = &MailFetch::MailFetchModify,
+                                             .remove = &MailFetch::MailFetchRemove,
+                                             .selected = &MailFetch::MailFetchSelected});
 
     auto *label = new QLabel(QStringLiteral("Poll time (s):"));
     label->setBuddy(pollTime_);
-    QVBoxLayout *column = group->column();
+    QVBoxLayout *column = group_->column();
     column->addSpacing(spaceAbovePollTime);
     column->addWidget(label);
     column->addWidget(pollTime_);
     column->addStretch();
-    group->fixColumnWidth(columnWidth);
-    newPageLayout(this)->addWidget(group);
+    group_->fixColumnWidth(columnWidth);
+    newPageLayout(this)->addWidget(group_);
 }
 
 void MailFetch::loadValues() {}
@@ -49,18 +48,13 @@ void MailFetch::storeValues() {
     }
 }
 
-void MailFetch::MailFetchAdd() {
-    addByDialog<EditFetch>(this, fetchers_, &pop_host_list.head, &MailFetch::MailFetchRead, shown);
-}
+void MailFetch::MailFetchAdd() { fetchers_.add(); }
 
-void MailFetch::MailFetchRemove() { removeCurrent(fetchers_, &pop_host_list.head, shown); }
+void MailFetch::MailFetchRemove() { fetchers_.removeCurrent(); }
 
-void MailFetch::MailFetchSelected(const char *user) {
-    changeByDialog<EditFetch>(this, fetchers_, &pop_host_list.head, user, &MailFetch::MailFetchRead,
-                              shown);
-}
+void MailFetch::MailFetchSelected(const char *user) { fetchers_.change(user); }
 
-void MailFetch::MailFetchModify() { MailFetchSelected(currentText(fetchers_)); }
+void MailFetch::MailFetchModify() { fetchers_.changeCurrent(); }
 
 void MailFetch::MailFetchRead(pop_host *host, EditFetch *dialog) {
     if (host != nullptr && dialog != nullptr) {

@@ -1,11 +1,12 @@
 #pragma once
 
+#include "fetch/pophosts.h"
 #include "platform/kconfigwidget.h"
+#include "widgets/listgroup.h"
+#include "widgets/recordrows.h"
 
 class EditFetch;
 class KNumericSpinBox;
-class QListBox;
-struct pop_host;
 
 /// The page of the mailboxes that mail is collected from. Its list is edited in place; the setting
 /// that holds it is written when the page stores its values.
@@ -26,6 +27,7 @@ public slots:
     void MailFetchRead(pop_host *host, EditFetch *dialog);
 
 private:
-    QListBox *fetchers_;
+    ListGroup *group_;
+    RecordRows<MailFetch, pop_host, EditFetch, std::string_view> fetchers_;
     KNumericSpinBox *pollTime_;
 };

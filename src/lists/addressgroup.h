@@ -9,20 +9,18 @@ class EditList;
 /// them, and the five buttons.
 class AddressGroup : public ListGroup {
 public:
-    /// The editor's slots for one list.
-    struct Slots {
-        void (EditList::*add)();
-        void (EditList::*modify)();
-        void (EditList::*remove)();
+    /// What the groups differ in.
+    struct Kind {
+        const char *caption;
+        AddressChain maillist_entry::*chain;
+        /// The text of an address's row.
+        KeptText (*shown)(const maillist_addr_entry &);
+        EditSlots<EditList> edit;
         void (EditList::*search)();
         void (EditList::*load)();
-        void (EditList::*selected)(const char *);
     };
-    /// The text of an address's row.
-    using Shown = KeptText (*)(const maillist_addr_entry &);
 
-    AddressGroup(const char *caption, EditList *editor, const Slots &slotsOf,
-                 const AddressChain &addresses, Shown shown);
+    AddressGroup(const Kind &kind, EditList *editor, const maillist_entry &list);
 
     [[nodiscard]] maillist_addr_entry **chain() { return &chain_.head; }
     /// The working copy changes hands; the group's is empty afterwards.

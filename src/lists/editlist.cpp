@@ -2,32 +2,28 @@
 
 #include "platform/knumericspinbox.h"
 #include "platform/lowscreen.h"
-#include "widgets/fieldrule.h"
-#include "widgets/fieldtext.h"
 #include "widgets/numberfield.h"
+#include "widgets/textfield.h"
 
 #include <QCheckBox>
 #include <QHBoxLayout>
 #include <QLabel>
-#include <QLineEdit>
 #include <QScrollArea>
-
-#include <new>
 
 namespace {
 
 constexpr int browseWidth = 60;
 constexpr int unitHeight = 20;
 constexpr int checkBoxHeight = 20;
-/// What rows keep around their text's height, in pixels, in a window that is too low for all.
-constexpr int aroundFieldText = 4;
-constexpr int aroundNumber = 6;
-constexpr int aroundCheckBoxText = 1;
-constexpr QSize leastWindow{600, 350};
+/// What rows keep beside their text's height, in pixels, in a window that is too low for all.
+constexpr int fieldPadding = 4;
+constexpr int numberPadding = 6;
+constexpr int checkBoxPadding = 1;
+constexpr QSize minimumWindow{600, 350};
 
 struct TextRow {
     TranslatableText caption;
-    KeptText maillist_entry::*field;
+    KeptText maillist_fields::*field;
 };
 
 constexpr std::array<TextRow, 5> addressRows{
@@ -64,13 +60,42 @@ struct Trigger {
     const char *caption;
     const char *unit;
     int unitWidth;
-    std::int32_t maillist_entry::*field;
+    std::int32_t maillist_fields::*field;
 };
 
-constexpr int highestTrigger = 1024;
+constexpr int maximumTrigger = 1024;
 constexpr std::array<Trigger, 2> triggers{
     {{"Digest size trigger:", " kB", 30, &maillist_entry::diglen},
      {"Digest count trigger:", " messages", 100, &maillist_entry::digno}}};
+
+constexpr std::array<AddressGroup::Kind, 3> addressKinds{
+    {{.caption = "List Members",
+      .chain = &maillist_entry::member,
+      .shown = addressShown,
+      .edit = {.add = &EditList::MemberAdd,
+               .modify = &EditList::MemberModify,
+               .remove = &EditList::MemberRemove,
+               .selected = &EditList::MemberSelected},
+      .search = &EditList::MemberSearch,
+      .load = &EditList::MemberLoad},
+     {.caption = "Allowed Posters",
+      .chain = &maillist_entry::allow,
+      .shown = addressStored,
+      .edit = {.add = &EditList::AllowAdd,
+               .modify = &EditList::AllowModify,
+               .remove = &EditList::AllowRemove,
+               .selected = &EditList::AllowSelected},
+      .search = &EditList::AllowSearch,
+      .load = &EditList::AllowLoad},
+     {.caption = "Blocked Posters",
+      .chain = &maillist_entry::block,
+      .shown = addressStored,
+      .edit = {.add = &EditList::BlockAdd,
+               .modify = &EditList::BlockModify,
+               .remove = &EditList::BlockRemove,
+               .selected = &EditList::BlockSelected},
+      .search = &EditList::BlockSearch,
+      .load = &EditList::BlockLoad}}};
 
 maillist_entry newList() {
     maillist_entry list;
@@ -92,7 +117,8 @@ QHBoxLayout *newRow(QVBoxLayout *rows) {
 }
 
 /// The widgets below each other, with a group's spacing between them.
-QVBoxLayout *newSide(std::initializer_list<QWidget *> widgets) {
+template <class Widgets>
+QVBoxLayout *newSide(const Widgets &widgets) {
     auto *side = new QVBoxLayout;
     side->setSpacing(0);
     for (QWidget *widget : widgets) {
@@ -107,41 +133,29 @@ QVBoxLayout *newSide(std::initializer_list<QWidget *> widgets) {
 } // namespace
 
 EditList::EditList(QWidget *parent, const char *name, const maillist_entry *list)
-    : FormDialog(parent, name, "Mailing List", aroundFieldText) {
+    : FormDialog(parent, name, "Mailing List", fieldPadding) {
     const maillist_entry standard = newList();
     const maillist_entry &shown = list != nullptr ? *list : standard;
-    QVBoxLayout *left = newSide({newTexts(shown), newOptions(shown)});
+    QVBoxLayout *left = newSide(std::array{newTexts(shown), newOptions(shown)});
     left->addStretch();
-    members_ = new AddressGroup("List Members", this,
-                                {&EditList::MemberAdd, &EditList::MemberModify,
-                                 &EditList::MemberRemove, &EditList::MemberSearch,
-                                 &EditList::MemberLoad, &EditList::MemberSelected},
-                                shown.member, addressShown);
-    allowed_ =
-        new AddressGroup("Allowed Posters", this,
-                         {&EditList::AllowAdd, &EditList::AllowModify, &EditList::AllowRemove,
-                          &EditList::AllowSearch, &EditList::AllowLoad, &EditList::AllowSelected},
-                         shown.allow, addressStored);
-    blocked_ =
-        new AddressGroup("Blocked Posters", this,
-                         {&EditList::BlockAdd, &EditList::BlockModify, &EditList::BlockRemove,
-                          &EditList::BlockSearch, &EditList::BlockLoad, &EditList::BlockSelected},
-                         shown.block, addressStored);
+    for (std::size_t index = 0; index < addressKinds.size(); ++index) {
+        groups_.at(index) = new AddressGroup(addressKinds.at(index), this, shown);
+    }
 
     auto *columns = new QWidget(this);
     auto *sides = new QHBoxLayout(columns);
     sides->setContentsMargins(0, 0, 0, 0);
     sides->setSpacing(groupSpacing);
     sides->addLayout(left, 150);
-    sides->addLayout(newSide({members_, allowed_, blocked_}), 300);
+    sides->addLayout(newSide(groups_), 300);
     rows()->addWidget(columns);
     addButtons(pageBorder, pageBorder, Shrinking::Yes);
-    const QSize room = roomFor(this);
-    if (!fitsInto(room, layout()->totalMinimumSize())) {
+    const QSize available = roomFor(this);
+    if (!fitsInto(available, layout()->totalMinimumSize())) {
         rows()->addWidget(scrolling(columns));
     }
-    setMinimumSize(leastWindow.expandedTo(layout()->totalMinimumSize()).boundedTo(room));
-    resize(layout()->totalSizeHint().boundedTo(room));
+    setMinimumSize(minimumWindow.expandedTo(layout()->totalMinimumSize()).boundedTo(available));
+    resize(layout()->totalSizeHint().boundedTo(available));
 }
 
 QGroupBox *EditList::newTexts(const maillist_entry &list) {
@@ -155,19 +169,21 @@ QGroupBox *EditList::newTexts(const maillist_entry &list) {
     for (std::size_t index = 0; index < fileRows.size(); ++index) {
         const auto &[text, browse] = fileRows.at(index);
         QHBoxLayout *row = newRow(rows);
-        files_.at(index) = addText(row, text.caption, fileCaptions, text.field, list);
-        connect(addBrowseButton(row, browseWidth, text.caption), &QPushButton::clicked, this,
+        TextField *file = addText(row, text.caption, fileCaptions, text.field, list);
+        connect(addBrowseButton(row, browseWidth, text.caption, file), &QPushButton::clicked, this,
                 browse);
+        files_.at(index) = file;
     }
     return group;
 }
 
-QLineEdit *EditList::addText(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
-                             KeptText maillist_entry::*field, const maillist_entry &list) {
-    QLineEdit *edit = addField(row, caption, captions, list.*field);
-    applyRule(edit, lengthRule(mostBytesOf(field)));
-    stores_.emplace_back(
-        [edit, field](maillist_entry &record) { record.*field = fieldText(edit, record.*field); });
+TextField *EditList::addText(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
+                             KeptText maillist_fields::*field, const maillist_entry &list) {
+    TextField *edit = addField(row, caption, captions, list.*field);
+    edit->setRule(lengthRule(mostBytesOf(field)));
+    stores_.emplace_back([edit, field](maillist_fields &fields) {
+        fields.*field = edit->keptText(fields.*field);
+    });
     return edit;
 }
 
@@ -177,40 +193,35 @@ QGroupBox *EditList::newOptions(const maillist_entry &list) {
     for (const auto &[caption, bit] : options) {
         auto *box = new QCheckBox(QString::fromUtf8(caption), group);
         box->setChecked((list.flags & bit) != 0);
-        addOfHeight(newRow(rows), box, checkBoxHeight, aroundCheckBoxText);
-        stores_.emplace_back([box, bit = bit](maillist_entry &record) {
-            record.flags = box->isChecked() ? record.flags | bit : record.flags & ~bit;
+        addOfHeight(newRow(rows), box, checkBoxHeight, checkBoxPadding);
+        stores_.emplace_back([box, bit = bit](maillist_fields &fields) {
+            fields.flags = box->isChecked() ? fields.flags | bit : fields.flags & ~bit;
         });
     }
     CaptionColumn captions{{120, unitHeight}};
     for (const auto &[caption, unit, unitWidth, field] : triggers) {
-        KNumericSpinBox *box = newNumberField(this, 0, highestTrigger, list.*field);
+        KNumericSpinBox *box = newNumberField(this, 0, maximumTrigger, list.*field);
         QHBoxLayout *row = newRow(rows);
         // With an alignment the labels' fixed height does not hold the row's down.
         row->addWidget(captions.newCaption(QString::fromUtf8(caption), box), 0, Qt::AlignVCenter);
-        addOfHeight(row, box, fieldHeight, aroundNumber);
+        addOfHeight(row, box, fieldHeight, numberPadding);
         QLabel *unitLabel = newLabel(QString::fromUtf8(unit), {unitWidth, unitHeight}, this);
         unitLabel->setBuddy(box);
         row->addWidget(unitLabel, 0, Qt::AlignVCenter);
         row->addStretch();
         stores_.emplace_back(
-            [box, field = field](maillist_entry &record) { record.*field = box->getValue(); });
+            [box, field = field](maillist_fields &fields) { fields.*field = box->getValue(); });
     }
     return group;
 }
 
 void EditList::store(maillist_entry &list) {
-    maillist_fields &fields = list;
-    const maillist_fields before = fields;
-    try {
-        for (const auto &storeWidget : stores_) {
-            storeWidget(list);
-        }
-    } catch (const std::bad_alloc &) {
-        fields = before;
-        throw;
+    maillist_fields fields = list;
+    for (const auto &storeWidget : stores_) {
+        storeWidget(fields);
     }
-    list.member = members_->takeChain();
-    list.allow = allowed_->takeChain();
-    list.block = blocked_->takeChain();
+    static_cast<maillist_fields &>(list) = fields;
+    for (std::size_t index = 0; index < addressKinds.size(); ++index) {
+        list.*addressKinds.at(index).chain = groups_.at(index)->takeChain();
+    }
 }

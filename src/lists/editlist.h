@@ -9,6 +9,7 @@
 #include <vector>
 
 class EditListAddr;
+class EditListMember;
 class QGroupBox;
 
 /// Edits one mailing list. Everything, the three address lists included, is a copy: the record
@@ -25,26 +26,24 @@ public:
     void store(maillist_entry &list);
 
 public slots:
-    void MemberAdd() { AddMember(members_->box(), members_->chain()); }
-    void MemberRemove() { Remove(members_->box(), members_->chain()); }
-    void MemberSelected(const char *text) {
-        SelectedMember(members_->box(), members_->chain(), text);
-    }
-    void MemberModify() { MemberSelected(currentText(members_->box())); }
-    void MemberSearch() { Search(members_->box(), members_->chain()); }
-    void MemberLoad() { Load(members_->box(), members_->chain()); }
-    void AllowAdd() { Add(allowed_->box(), allowed_->chain()); }
-    void AllowRemove() { Remove(allowed_->box(), allowed_->chain()); }
-    void AllowSelected(const char *text) { Selected(allowed_->box(), allowed_->chain(), text); }
-    void AllowModify() { AllowSelected(currentText(allowed_->box())); }
-    void AllowSearch() { Search(allowed_->box(), allowed_->chain()); }
-    void AllowLoad() { Load(allowed_->box(), allowed_->chain()); }
-    void BlockAdd() { Add(blocked_->box(), blocked_->chain()); }
-    void BlockRemove() { Remove(blocked_->box(), blocked_->chain()); }
-    void BlockSelected(const char *text) { Selected(blocked_->box(), blocked_->chain(), text); }
-    void BlockModify() { BlockSelected(currentText(blocked_->box())); }
-    void BlockSearch() { Search(blocked_->box(), blocked_->chain()); }
-    void BlockLoad() { Load(blocked_->box(), blocked_->chain()); }
+    void MemberAdd() { AddMember(box(members), chain(members)); }
+    void MemberRemove() { Remove(box(members), chain(members)); }
+    void MemberSelected(const char *text) { SelectedMember(box(members), chain(members), text); }
+    void MemberModify() { chooseCurrent(members, &EditList::MemberSelected); }
+    void MemberSearch() { Search(box(members), chain(members)); }
+    void MemberLoad() { Load(box(members), chain(members)); }
+    void AllowAdd() { Add(box(allowed), chain(allowed)); }
+    void AllowRemove() { Remove(box(allowed), chain(allowed)); }
+    void AllowSelected(const char *text) { Selected(box(allowed), chain(allowed), text); }
+    void AllowModify() { chooseCurrent(allowed, &EditList::AllowSelected); }
+    void AllowSearch() { Search(box(allowed), chain(allowed)); }
+    void AllowLoad() { Load(box(allowed), chain(allowed)); }
+    void BlockAdd() { Add(box(blocked), chain(blocked)); }
+    void BlockRemove() { Remove(box(blocked), chain(blocked)); }
+    void BlockSelected(const char *text) { Selected(box(blocked), chain(blocked), text); }
+    void BlockModify() { chooseCurrent(blocked, &EditList::BlockSelected); }
+    void BlockSearch() { Search(box(blocked), chain(blocked)); }
+    void BlockLoad() { Load(box(blocked), chain(blocked)); }
     void Add(QListBox *box, maillist_addr_entry **chain);
     void AddMember(QListBox *box, maillist_addr_entry **chain);
     void Remove(QListBox *box, maillist_addr_entry **chain);
@@ -60,12 +59,17 @@ public slots:
 private:
     QGroupBox *newTexts(const maillist_entry &list);
     QGroupBox *newOptions(const maillist_entry &list);
-    QLineEdit *addText(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
-                       KeptText maillist_entry::*field, const maillist_entry &list);
+    TextField *addText(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
+                       KeptText maillist_fields::*field, const maillist_entry &list);
 
-    std::vector<std::function<void(maillist_entry &)>> stores_; ///< One for each widget.
-    std::array<QLineEdit *, 3> files_{};                        ///< Info, header, footer.
-    AddressGroup *members_ = nullptr;
-    AddressGroup *allowed_ = nullptr;
-    AddressGroup *blocked_ = nullptr;
+    enum Kind : std::uint8_t { members, allowed, blocked };
+    [[nodiscard]] QListBox *box(Kind kind) const { return groups_.at(kind)->box(); }
+    [[nodiscard]] maillist_addr_entry **chain(Kind kind) const { return groups_.at(kind)->chain(); }
+    /// Does what choosing the current row does; nothing where there is none.
+    void chooseCurrent(Kind kind, void (EditList::*selected)(const char *));
+    void ReadMember(maillist_addr_entry *entry, EditListMember *dialog);
+
+    std::vector<std::function<void(maillist_fields &)>> stores_; ///< One for each widget.
+    std::array<TextField *, 3> files_{};                         ///< Info, header, footer.
+    std::array<AddressGroup *, 3> groups_{};                     ///< By their kind.
 };

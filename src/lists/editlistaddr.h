@@ -17,5 +17,5 @@ public:
     [[nodiscard]] KeptText email(KeptText before) const;
 
 private:
-    QLineEdit *email_;
+    TextField *email_;
 };

@@ -2,13 +2,10 @@
 
 #include "lists/listdialog.h"
 #include "lists/maillistfile.h"
-#include "widgets/fieldrule.h"
-#include "widgets/fieldtext.h"
-#include "widgets/fieldtip.h"
-#include "widgets/leastsize.h"
+#include "widgets/minimumsize.h"
+#include "widgets/textfield.h"
 
 #include <QCheckBox>
-#include <QLineEdit>
 #include <QVBoxLayout>
 
 #include <algorithm>
@@ -26,9 +23,9 @@ EditListMember::EditListMember(QWidget *parent, const char *name, const maillist
       email_{addField(translatable("&Email:"), listDialogLabel,
                       entry != nullptr ? addressShown(*entry) : KeptText{})},
       digest_{new QCheckBox(QStringLiteral("Digest List"))},
-      mostBytes_{std::max(longestTyped, entry != nullptr ? entry->addr.size() : 0)} {
-    applyRule(email_, lengthRule(longestTyped));
-    digest_->setFixedHeight(leastSize(digest_, {0, checkBoxHeight}).height());
+      maximumBytes_{std::max(longestTyped, entry != nullptr ? entry->addr.size() : 0)} {
+    email_->setRule(lengthRule(longestTyped));
+    digest_->setFixedHeight(minimumSizeFor(digest_, {0, checkBoxHeight}).height());
     digest_->setChecked(entry != nullptr && isOnDigest(*entry));
     rows()->setSpacing(spaceAroundDigest);
     rows()->addWidget(digest_);
@@ -39,15 +36,15 @@ EditListMember::EditListMember(QWidget *parent, const char *name, const maillist
 void EditListMember::accept() {
     // The digest's mark takes a byte of the line as well.
     const std::size_t digestMark = digest_->isChecked() ? 1 : 0;
-    if (!showsPartOnly(email_) && fieldBytes(email_).size() + digestMark > mostBytes_) {
-        showFieldTip(email_, lengthRule(mostBytes_ - digestMark).toolTip);
+    if (!email_->showsPartOnly() && email_->bytes().size() + digestMark > maximumBytes_) {
+        email_->showTip(lengthRule(maximumBytes_ - digestMark).toolTip);
         return;
     }
     FormDialog::accept();
 }
 
 KeptText EditListMember::addr(const maillist_addr_entry &before) const {
-    const KeptText address = fieldText(email_, addressShown(before));
+    const KeptText address = email_->keptText(addressShown(before));
     if (!digest_->isChecked()) {
         return address;
     }

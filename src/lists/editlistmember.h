@@ -21,7 +21,7 @@ protected:
     void accept() override;
 
 private:
-    QLineEdit *email_;
+    TextField *email_;
     QCheckBox *digest_;
-    std::size_t mostBytes_; ///< Of the record's text.
+    std::size_t maximumBytes_; ///< Of the record's text.
 };

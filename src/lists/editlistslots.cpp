@@ -6,9 +6,7 @@
 #include "lists/listload.h"
 #include "lists/listsearch.h"
 #include "platform/helpkey.h"
-#include "widgets/recordrows.h"
 
-#include <QLineEdit>
 #include <QMessageBox>
 #include <QPushButton>
 
@@ -30,30 +28,32 @@ void showUnreadable(QWidget *editor) {
     message.exec();
 }
 
-void readMember(EditList * /*editor*/, maillist_addr_entry *entry, EditListMember *dialog) {
-    entry->addr = dialog->addr(*entry);
-}
-
 } // namespace
 
 void EditList::Add(QListBox *box, maillist_addr_entry **chain) {
-    addByDialog<EditListAddr>(this, box, chain, &EditList::Read, addressStored);
+    RecordRows{this, box, chain, addressStored, &EditList::Read}.add();
 }
 
 void EditList::AddMember(QListBox *box, maillist_addr_entry **chain) {
-    addByDialog<EditListMember>(this, box, chain, readMember, addressShown);
+    RecordRows{this, box, chain, addressShown, &EditList::ReadMember}.add();
 }
 
 void EditList::Remove(QListBox *box, maillist_addr_entry **chain) {
-    removeCurrent(box, chain, addressShown);
+    RecordRows{this, box, chain, addressShown, &EditList::Read}.removeCurrent();
 }
 
 void EditList::Selected(QListBox *box, maillist_addr_entry **chain, const char *text) {
-    changeByDialog<EditListAddr>(this, box, chain, text, &EditList::Read, addressStored);
+    RecordRows{this, box, chain, addressStored, &EditList::Read}.change(text);
 }
 
 void EditList::SelectedMember(QListBox *box, maillist_addr_entry **chain, const char *text) {
-    changeByDialog<EditListMember>(this, box, chain, text, readMember, addressShown);
+    RecordRows{this, box, chain, addressShown, &EditList::ReadMember}.change(text);
+}
+
+void EditList::chooseCurrent(Kind kind, void (EditList::*selected)(const char *)) {
+    if (const std::optional<int> row = box(kind)->currentRow()) {
+        (this->*selected)(std::string{box(kind)->text(*row)}.c_str());
+    }
 }
 
 void EditList::Search(QListBox *box, maillist_addr_entry ** /*chain*/) {
@@ -79,14 +79,13 @@ void EditList::Load(QListBox *box, maillist_addr_entry **chain) {
             return;
         }
         AddressChain loaded = parseAddressLines(*file.bytes);
-        std::vector<std::string_view> rows;
+        std::vector<KeptText> rows;
         for (const maillist_addr_entry &address : loaded) {
             rows.push_back(address.addr);
         }
         std::ranges::reverse(rows); // The file's first address is the chain's last.
-        box->reserve(rows);
-        prependChain(chain, std::move(loaded));
         box->append(rows);
+        prependChain(chain, std::move(loaded));
         if (!rows.empty()) {
             box->showRow(box->count() - 1);
         }
@@ -98,4 +97,8 @@ void EditList::Read(maillist_addr_entry *entry, EditListAddr *dialog) {
     if (entry != nullptr && dialog != nullptr) {
         entry->addr = dialog->email(entry->addr);
     }
+}
+
+void EditList::ReadMember(maillist_addr_entry *entry, EditListMember *dialog) {
+    entry->addr = dialog->addr(*entry);
 }

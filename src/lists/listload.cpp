@@ -1,7 +1,7 @@
 #include "lists/listload.h"
 
 #include "lists/listdialog.h"
-#include "widgets/fieldtext.h"
+#include "widgets/textfield.h"
 
 #include <QHBoxLayout>
 #include <QPushButton>
@@ -11,12 +11,12 @@ ListLoad::ListLoad(QWidget *parent, const char *name)
     QHBoxLayout *row = addRow();
     CaptionColumn captions{listDialogLabel};
     fileName_ = addField(row, translatable("&Filename:"), captions, {});
-    connect(addBrowseButton(row, 70, translatable("&Filename:")), &QPushButton::clicked, this,
-            &ListLoad::browse);
+    connect(addBrowseButton(row, 70, translatable("&Filename:"), fileName_), &QPushButton::clicked,
+            this, &ListLoad::browse);
     addButtons(listDialogBorder, 20);
     fixSize(listDialogSize, listDialogSize);
 }
 
-std::string ListLoad::fileName() const { return fieldBytes(fileName_); }
+std::string ListLoad::fileName() const { return fileName_->bytes(); }
 
 void ListLoad::browse() { browseForFile(fileName_, this); }

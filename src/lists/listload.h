@@ -17,5 +17,5 @@ public slots:
     void browse();
 
 private:
-    QLineEdit *fileName_;
+    TextField *fileName_;
 };

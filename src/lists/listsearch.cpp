@@ -2,7 +2,7 @@
 
 #include "lists/listdialog.h"
 #include "platform/qlistbox.h"
-#include "widgets/fieldtext.h"
+#include "widgets/textfield.h"
 
 #include <functional>
 
@@ -13,7 +13,7 @@ ListSearch::ListSearch(QWidget *parent, const char *name)
     fixSize(listDialogSize, listDialogSize);
 }
 
-std::string ListSearch::text() const { return fieldBytes(text_); }
+std::string ListSearch::text() const { return text_->bytes(); }
 
 std::optional<int> nextRowHolding(const QListBox *box, const std::string &needle) {
     // A searcher that is made once: rows are short, and std::string_view::find begins anew at each.

@@ -17,7 +17,7 @@ public:
     [[nodiscard]] std::string text() const;
 
 private:
-    QLineEdit *text_;
+    TextField *text_;
 };
 
 /// The row after the current one, from the top again behind the last, that holds the needle. The

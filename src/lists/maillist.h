@@ -1,10 +1,11 @@
 #pragma once
 
+#include "lists/maillistfile.h"
 #include "platform/kconfigwidget.h"
+#include "widgets/listgroup.h"
+#include "widgets/recordrows.h"
 
 class EditList;
-class QListBox;
-struct maillist_entry;
 
 /// The page of the mailing lists. They are edited in place.
 class MailList : public KConfigWidget {
@@ -24,5 +25,6 @@ public slots:
     void MailListRead(maillist_entry *record, EditList *editor);
 
 private:
-    QListBox *lists_;
+    ListGroup *group_;
+    RecordRows<MailList, maillist_entry, EditList> lists_;
 };

@@ -1,6 +1,5 @@
 #include "platform/qlistbox.h"
 
-#include "base/bulkmemory.h"
 #include "platform/bytetext.h"
 
 #include <QAbstractListModel>
@@ -18,25 +17,23 @@
 namespace {
 
 /// More than any window shows of a row; a file can give a row of any length.
-constexpr std::size_t mostBytesShown = 1024;
+constexpr std::size_t maximumBytesShown = 1024;
 
 } // namespace
 
-/// The texts stand in one buffer, each with a NUL behind it, and the rows say where. A text that
-/// was replaced or removed keeps its bytes there until the list goes.
 class QListBox::Rows : public QAbstractListModel {
 public:
     using QAbstractListModel::QAbstractListModel;
 
     [[nodiscard]] int rowCount(const QModelIndex &parent = {}) const override {
-        return parent.isValid() ? 0 : static_cast<int>(rows_.size());
+        return parent.isValid() ? 0 : static_cast<int>(texts_.size());
     }
 
     /// The view asks for every row's index whenever it lays the list out; the inherited way takes
     /// several calls more.
     [[nodiscard]] QModelIndex index(int row, int column = 0,
                                     const QModelIndex &parent = {}) const override {
-        const bool exists = row >= 0 && static_cast<std::size_t>(row) < rows_.size();
+        const bool exists = row >= 0 && static_cast<std::size_t>(row) < texts_.size();
         return exists && column == 0 && !parent.isValid() ? createIndex(row, 0) : QModelIndex{};
     }
 
@@ -44,75 +41,39 @@ public:
         if (!index.isValid() || (role != Qt::DisplayRole && role != Qt::ToolTipRole)) {
             return {};
         }
-        const QString text = textFromBytes(at(index.row()).substr(0, mostBytesShown));
+        const QString text = textFromBytes(at(index.row()).substr(0, maximumBytesShown));
         return role == Qt::ToolTipRole && Qt::mightBeRichText(text) ? text.toHtmlEscaped() : text;
     }
 
-    [[nodiscard]] std::string_view at(int row) const {
-        const Row &place = rows_.at(static_cast<std::size_t>(row));
-        return {texts_.data() + place.begin, place.length};
-    }
+    [[nodiscard]] KeptText at(int row) const { return texts_.at(static_cast<std::size_t>(row)); }
 
-    void reserve(const std::vector<std::string_view> &texts) {
-        std::size_t length = texts_.size() + texts.size(); // Each with its NUL.
-        for (const std::string_view text : texts) {
-            length += text.size();
-        }
-        makeRoom(texts_, length);
-        makeRoom(rows_, rows_.size() + texts.size());
-    }
-
-    void append(const std::vector<std::string_view> &texts) {
+    void append(const std::vector<KeptText> &texts) {
         if (texts.empty()) {
             return;
         }
-        reserve(texts); // What can fail comes before the views hear of new rows.
+        const std::size_t count = texts_.size() + texts.size();
+        if (count > texts_.capacity()) { // What can fail comes before the views hear of new rows.
+            texts_.reserve(count + count / 8);
+        }
         const int first = rowCount();
         beginInsertRows({}, first, first + static_cast<int>(texts.size()) - 1);
-        for (const std::string_view text : texts) {
-            rows_.push_back(placed(text));
-        }
+        texts_.insert(texts_.end(), texts.begin(), texts.end());
         endInsertRows();
     }
 
-    void change(int row, std::string_view text) {
-        rows_.at(static_cast<std::size_t>(row)) = placed(text);
+    void change(int row, KeptText text) {
+        texts_.at(static_cast<std::size_t>(row)) = text;
         emit dataChanged(index(row), index(row));
     }
 
     void remove(int row) {
         beginRemoveRows({}, row, row);
-        rows_.erase(rows_.begin() + row);
+        texts_.erase(texts_.begin() + row);
         endRemoveRows();
     }
 
 private:
-    struct Row {
-        std::size_t begin; ///< In `texts_`.
-        std::size_t length;
-    };
-
-    /// With an eighth to spare: doubling the room of a long list for one row more would be seen.
-    template <class Container>
-    static void makeRoom(Container &container, std::size_t size) {
-        if (size > container.capacity()) {
-            const std::size_t room = size + size / 8;
-            leaveMemoryForToolkit(room * sizeof(typename Container::value_type));
-            container.reserve(room);
-            adviseLargePages(container.data(), room * sizeof(typename Container::value_type));
-        }
-    }
-
-    Row placed(std::string_view text) {
-        makeRoom(texts_, texts_.size() + text.size() + 1);
-        const Row row{texts_.size(), text.size()};
-        texts_.insert(texts_.end(), text.begin(), text.end());
-        texts_.push_back('\0');
-        return row;
-    }
-
-    std::vector<char> texts_;
-    std::vector<Row> rows_;
+    std::vector<KeptText> texts_;
 };
 
 /// Rows ask for no width: the list has that of its window, and a longer text ends in dots. Their
@@ -148,18 +109,16 @@ QListBox::QListBox(QWidget *parent) : QListView(parent), rows_{new Rows(this)} {
 
 int QListBox::count() const { return rows_->rowCount(); }
 
-std::string_view QListBox::text(int row) const { return rows_->at(row); }
+KeptText QListBox::text(int row) const { return rows_->at(row); }
 
-void QListBox::append(std::string_view text) {
+void QListBox::append(KeptText text) {
     append(std::vector{text});
     showRow(count() - 1);
 }
 
-void QListBox::append(const std::vector<std::string_view> &texts) { rows_->append(texts); }
+void QListBox::append(const std::vector<KeptText> &texts) { rows_->append(texts); }
 
-void QListBox::reserve(const std::vector<std::string_view> &texts) { rows_->reserve(texts); }
-
-void QListBox::changeText(int row, std::string_view text) { rows_->change(row, text); }
+void QListBox::changeText(int row, KeptText text) { rows_->change(row, text); }
 
 void QListBox::remove(int row) {
     const bool wasCurrent = currentRow() == row;
@@ -260,6 +219,6 @@ QItemSelectionModel::SelectionFlags QListBox::selectionCommand(const QModelIndex
 }
 
 void QListBox::emitSelected(int row) {
-    const std::string chosen{text(row)}; // The row may change while the signal is answered.
+    const std::string chosen{text(row)}; // With a NUL behind it.
     emit selected(chosen.c_str());
 }

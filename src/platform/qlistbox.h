@@ -1,12 +1,13 @@
 #pragma once
 
+#include "base/kepttext.h"
+
 #include <QListView>
 
 #include <optional>
-#include <string_view>
 #include <vector>
 
-/// A list of one byte text a row. The current row is always the highlighted one, and there is none
+/// A list of one kept text a row. The current row is always the highlighted one, and there is none
 /// until the user or the program chooses one: getting the focus does not choose. A row that is
 /// wider than the list ends in dots, and a tool tip shows more of it. Filling, changing and
 /// scrolling stay linear with a million rows.
@@ -18,18 +19,13 @@ public:
 
     [[nodiscard]] int count() const;
     /// `row` is 0 to count() - 1; so in all that follows.
-    /// A NUL stands behind it. Valid until the list changes.
-    [[nodiscard]] std::string_view text(int row) const;
-
-    // A text that is given to the list must not be one of its own.
+    [[nodiscard]] KeptText text(int row) const;
 
     /// Adds a row and scrolls it into sight, without choosing it.
-    void append(std::string_view text);
-    /// Adds many rows with one repaint; does not scroll.
-    void append(const std::vector<std::string_view> &texts);
-    /// Gets the memory that `append` needs for these texts. Throws std::bad_alloc; the rows stay.
-    void reserve(const std::vector<std::string_view> &texts);
-    void changeText(int row, std::string_view text);
+    void append(KeptText text);
+    /// Adds many rows with one repaint; does not scroll. Throws std::bad_alloc; the rows stay.
+    void append(const std::vector<KeptText> &texts);
+    void changeText(int row, KeptText text);
     /// When the current row goes, the one that takes its place, or else the last, becomes current.
     void remove(int row);
 

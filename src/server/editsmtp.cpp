@@ -1,7 +1,7 @@
 #include "server/editsmtp.h"
 
 #include "server/smtprejectfile.h"
-#include "widgets/fieldtext.h"
+#include "widgets/textfield.h"
 
 EditSMTP::EditSMTP(QWidget *parent, const char *name, const smtpreject_entry *entry)
     : FormDialog(parent, name, "Email Address Aliasing"),
@@ -11,4 +11,4 @@ EditSMTP::EditSMTP(QWidget *parent, const char *name, const smtpreject_entry *en
     fixSize({300, 70}, {298, 45});
 }
 
-KeptText EditSMTP::address(KeptText before) const { return fieldText(address_, before); }
+KeptText EditSMTP::address(KeptText before) const { return address_->keptText(before); }

@@ -17,5 +17,5 @@ public:
     [[nodiscard]] KeptText address(KeptText before) const;
 
 private:
-    QLineEdit *address_;
+    TextField *address_;
 };

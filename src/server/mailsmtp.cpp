@@ -3,14 +3,12 @@
 #include "server/editsmtp.h"
 #include "server/serverform.h"
 #include "server/smtprejectfile.h"
-#include "widgets/listgroup.h"
-#include "widgets/recordrows.h"
 
 #include <QVBoxLayout>
 
 namespace {
 
-std::string_view shown(const smtpreject_entry &entry) { return entry.domain; }
+KeptText shown(const smtpreject_entry &entry) { return entry.domain; }
 
 } // namespace
 
@@ -19,14 +17,16 @@ MailSMTP::MailSMTP(QWidget *parent, const char *name)
       form_{serverForm(this, "SMTP Server Settings",
                        {settings().smtp_sock_enabled, settings().smtp_sock_port,
                         settings().smtp_sock_timeout, settings().smtp_sock_max,
-                        settings().smtp_allow, &settings().smtp_auth, settings().smtp_block})} {
-    auto *group = new ListGroup("SMTP Domain Blocking", {6, 1}, this);
-    rejects_ = group->box();
-    appendRows(rejects_, smtpreject_list, shown);
-    group->addEditButtons(this, &MailSMTP::Add, &MailSMTP::Modify, &MailSMTP::Remove,
-                          &MailSMTP::Selected);
-    group->column()->addStretch();
-    form_.pageLayout()->addWidget(group);
+                        settings().smtp_allow, &settings().smtp_auth, settings().smtp_block})},
+      group_{new ListGroup("SMTP Domain Blocking", {6, 1}, this)},
+      rejects_{this, group_->box(), &smtpreject_list.head, shown, &MailSMTP::Read} {
+    rejects_.fill();
+    group_->addEditButtons<MailSMTP>(this, {.add = &MailSMTP::Add,
+                                            .modify = &MailSMTP::Modify,
+                                            .remove = &MailSMTP::Remove,
+                                            .selected = &MailSMTP::Selected});
+    group_->column()->addStretch();
+    form_.pageLayout()->addWidget(group_);
     form_.pageLayout()->addStretch(1);
 }
 
@@ -34,17 +34,13 @@ void MailSMTP::loadValues() {}
 
 void MailSMTP::storeValues() { form_.store(); }
 
-void MailSMTP::Add() {
-    addByDialog<EditSMTP>(this, rejects_, &smtpreject_list.head, &MailSMTP::Read, shown);
-}
+void MailSMTP::Add() { rejects_.add(); }
 
-void MailSMTP::Remove() { removeCurrent(rejects_, &smtpreject_list.head, shown); }
+void MailSMTP::Remove() { rejects_.removeCurrent(); }
 
-void MailSMTP::Selected(const char *text) {
-    changeByDialog<EditSMTP>(this, rejects_, &smtpreject_list.head, text, &MailSMTP::Read, shown);
-}
+void MailSMTP::Selected(const char *text) { rejects_.change(text); }
 
-void MailSMTP::Modify() { Selected(currentText(rejects_)); }
+void MailSMTP::Modify() { rejects_.changeCurrent(); }
 
 void MailSMTP::Read(smtpreject_entry *entry, EditSMTP *dialog) {
     if (entry != nullptr && dialog != nullptr) {

@@ -1,11 +1,12 @@
 #pragma once
 
 #include "platform/kconfigwidget.h"
+#include "server/smtprejectfile.h"
+#include "widgets/listgroup.h"
+#include "widgets/recordrows.h"
 #include "widgets/settingsform.h"
 
 class EditSMTP;
-class QListBox;
-struct smtpreject_entry;
 
 /// The SMTP server's page: its settings, and its block list, which is edited in place.
 class MailSMTP : public KConfigWidget {
@@ -26,5 +27,6 @@ public slots:
 
 private:
     SettingsForm form_;
-    QListBox *rejects_;
+    ListGroup *group_;
+    RecordRows<MailSMTP, smtpreject_entry, EditSMTP> rejects_;
 };

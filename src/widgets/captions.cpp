@@ -1,6 +1,6 @@
 #include "widgets/captions.h"
 
-#include "widgets/leastsize.h"
+#include "widgets/minimumsize.h"
 
 #include <QLabel>
 
@@ -16,23 +16,23 @@ QString plainName(QString caption) {
     return caption.trimmed();
 }
 
-QLabel *newLabel(const QString &caption, QSize least, QWidget *parent) {
+QLabel *newLabel(const QString &caption, QSize minimum, QWidget *parent) {
     auto *label = new QLabel(caption, parent);
-    label->setFixedSize(leastSize(label, least));
+    label->setFixedSize(minimumSizeFor(label, minimum));
     return label;
 }
 
 QLabel *CaptionColumn::newCaption(const QString &caption, QWidget *field) {
     auto *label = new QLabel(caption, field->parentWidget());
     label->setBuddy(field);
-    const QSize size = leastSize(label, least_);
+    const QSize size = minimumSizeFor(label, minimum_);
     if (size.height() > 0) {
         label->setFixedHeight(size.height());
     }
     label->setFixedWidth(size.width());
     labels_.push_back(label);
-    if (size.width() > least_.width()) {
-        least_.setWidth(size.width());
+    if (size.width() > minimum_.width()) {
+        minimum_.setWidth(size.width());
         for (QLabel *above : labels_) {
             above->setFixedWidth(size.width());
         }

@@ -17,19 +17,19 @@ QString translated(TranslatableText caption);
 QString plainName(QString caption);
 
 /// A label of at least that size in which the whole caption is seen.
-QLabel *newLabel(const QString &caption, QSize least, QWidget *parent);
+QLabel *newLabel(const QString &caption, QSize minimum, QWidget *parent);
 
 /// The captions of one form's fields. All are as wide as the widest of them needs, so that the
 /// fields beside them begin at one x.
 class CaptionColumn {
 public:
     /// A height of 0 leaves the captions' height to their rows.
-    explicit CaptionColumn(QSize least) : least_{least} {}
+    explicit CaptionColumn(QSize minimum) : minimum_{minimum} {}
 
     /// A label in the field's parent, with the field as its buddy.
     QLabel *newCaption(const QString &caption, QWidget *field);
 
 private:
-    QSize least_;
+    QSize minimum_;
     std::vector<QLabel *> labels_;
 };

@@ -2,15 +2,13 @@
 
 #include "platform/helpkey.h"
 #include "platform/lowscreen.h"
-#include "widgets/fieldrule.h"
-#include "widgets/fieldtext.h"
-#include "widgets/leastsize.h"
+#include "widgets/minimumsize.h"
+#include "widgets/textfield.h"
 
 #include <QFileDialog>
 #include <QFrame>
 #include <QHBoxLayout>
 #include <QLabel>
-#include <QLineEdit>
 #include <QPushButton>
 
 #include <algorithm>
@@ -18,7 +16,7 @@
 namespace {
 
 constexpr QSize buttonSize{70, 30};
-constexpr int leastCharactersSeen = 16;
+constexpr int minimumCharactersSeen = 16;
 
 /// There is no path after "Cancel", and the toolkit replaces bytes of a name that are not UTF-8:
 /// such a path would lead elsewhere.
@@ -26,25 +24,25 @@ bool isWholePath(const QString &path) {
     return !path.isEmpty() && !path.contains(QChar::ReplacementCharacter);
 }
 
-void browse(QLineEdit *field, QFileDialog &chooser) {
+void browse(TextField *field, QFileDialog &chooser) {
     addHelpKey(&chooser);
     chooser.resize(chooser.sizeHint().boundedTo(roomFor(&chooser)));
     chooser.setWindowModality(Qt::WindowModal); // The help stays usable here as well.
-    if (field->isReadOnly() || chooser.exec() != QDialog::Accepted) {
+    if (field->showsPartOnly() || chooser.exec() != QDialog::Accepted) {
         return;
     }
     const QString path = chooser.selectedFiles().value(0);
     if (isWholePath(path)) {
-        replaceByRule(field, path);
+        field->replaceText(path);
     }
 }
 
 } // namespace
 
 FormDialog::FormDialog(QWidget *parent, const char *name, const char *caption,
-                       std::optional<int> aroundFieldText)
+                       std::optional<int> fieldPadding)
     : QDialog(parent),
-      aroundFieldText_{aroundFieldText},
+      fieldPadding_{fieldPadding},
       panel_{new QFrame(this)},
       layout_{new QVBoxLayout(this)},
       rows_{new QVBoxLayout},
@@ -68,33 +66,33 @@ QHBoxLayout *FormDialog::addRow() {
     return row;
 }
 
-QLineEdit *FormDialog::addField(TranslatableText caption, QSize label, std::string_view bytes) {
+TextField *FormDialog::addField(TranslatableText caption, QSize label, std::string_view bytes) {
     CaptionColumn captions{label};
     return addField(addRow(), caption, captions, bytes);
 }
 
-QLineEdit *FormDialog::addField(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
+TextField *FormDialog::addField(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
                                 std::string_view bytes) {
-    QLineEdit *field = newField(this);
-    field->setMinimumWidth(leastCharactersSeen * field->fontMetrics().averageCharWidth());
-    showBytes(field, bytes);
+    TextField *field = new TextField(this);
+    field->setMinimumWidth(minimumCharactersSeen * field->fontMetrics().averageCharWidth());
+    field->showBytes(bytes);
     row->addWidget(captions.newCaption(translated(caption), field));
     addAsField(row, field);
     fields_.push_back(field);
     return field;
 }
 
-QPushButton *FormDialog::addBrowseButton(QHBoxLayout *row, int width, TranslatableText caption) {
+QPushButton *FormDialog::addBrowseButton(QHBoxLayout *row, int width, TranslatableText caption,
+                                         const TextField *field) {
     auto *button = new QPushButton(QStringLiteral("Browse..."), this);
     button->setAccessibleName(plainName(translated(caption)) + ": " + button->text());
-    button->setFixedWidth(leastSize(button, {width, fieldHeight}).width());
-    const int height = row->itemAt(row->count() - 1)->widget()->maximumHeight();
-    addOfHeight(row, button, height, aroundFieldText_);
+    button->setFixedWidth(minimumSizeFor(button, {width, fieldHeight}).width());
+    addOfHeight(row, button, field->maximumHeight(), fieldPadding_);
     return button;
 }
 
 void FormDialog::addAsField(QHBoxLayout *row, QWidget *widget) {
-    addOfHeight(row, widget, fieldHeight, aroundFieldText_);
+    addOfHeight(row, widget, fieldHeight, fieldPadding_);
 }
 
 void FormDialog::addButtons(int aboveRows, int aboveButtons, Shrinking shrinking) {
@@ -109,7 +107,7 @@ void FormDialog::addButtons(int aboveRows, int aboveButtons, Shrinking shrinking
     for (const auto &[caption, slot] :
          {std::pair{"OK", &QDialog::accept}, std::pair{"Cancel", &QDialog::reject}}) {
         auto *button = new QPushButton(QString::fromUtf8(caption), this);
-        button->setFixedSize(leastSize(button, buttonSize));
+        button->setFixedSize(minimumSizeFor(button, buttonSize));
         button->setDefault(slot == &QDialog::accept);
         connect(button, &QPushButton::clicked, this, slot);
         buttons_->addWidget(button);
@@ -122,7 +120,7 @@ void FormDialog::fixSize(QSize dialog, QSize panel) {
 }
 
 void FormDialog::accept() {
-    if (std::ranges::none_of(fields_, holdsRefusedText)) {
+    if (std::ranges::none_of(fields_, &TextField::holdsRefusedText)) {
         QDialog::accept();
     }
 }
@@ -133,13 +131,13 @@ void FormDialog::resizeEvent(QResizeEvent *event) {
     panel_->setGeometry(0, 0, panel.width(), std::min(panel.height(), buttons_->geometry().top()));
 }
 
-void browseForFile(QLineEdit *field, QWidget *parent) {
+void browseForFile(TextField *field, QWidget *parent) {
     QFileDialog chooser{parent, {}, field->text()};
     chooser.setFileMode(QFileDialog::ExistingFile);
     browse(field, chooser);
 }
 
-void browseForDirectory(QLineEdit *field, QWidget *parent) {
+void browseForDirectory(TextField *field, QWidget *parent) {
     QFileDialog chooser{parent, {}, field->text()};
     chooser.setObjectName("browse");
     chooser.setFileMode(QFileDialog::Directory);

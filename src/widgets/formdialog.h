@@ -10,9 +10,9 @@
 
 class QFrame;
 class QHBoxLayout;
-class QLineEdit;
 class QPushButton;
 class QVBoxLayout;
+class TextField;
 
 /// What all edit dialogs are made of: a raised panel with the rows on it and, below, "OK" and
 /// "Cancel". A dialog collects input and applies nothing; who opened it reads it when it was
@@ -22,23 +22,23 @@ public:
     static constexpr int fieldHeight = 25;
 
 protected:
-    /// With `aroundFieldText` the fields may shrink; see addOfHeight.
+    /// With `fieldPadding` the fields may shrink; see addOfHeight.
     FormDialog(QWidget *parent, const char *name, const char *caption,
-               std::optional<int> aroundFieldText = std::nullopt);
+               std::optional<int> fieldPadding = std::nullopt);
 
     /// The rows on the panel, from top to bottom.
     [[nodiscard]] QVBoxLayout *rows() const { return rows_; }
     QHBoxLayout *addRow();
 
     /// A row of a label and a line edit showing `bytes`; the label is the edit's buddy. `label` is
-    /// the label's least size.
-    QLineEdit *addField(TranslatableText caption, QSize label, std::string_view bytes);
+    /// the label's minimum size.
+    TextField *addField(TranslatableText caption, QSize label, std::string_view bytes);
     /// The same in a row that is there already, and in a column of captions.
-    QLineEdit *addField(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
+    TextField *addField(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
                         std::string_view bytes);
-    /// The push button "Browse..." behind the row's field, which is the one captioned `caption`,
-    /// and as high.
-    QPushButton *addBrowseButton(QHBoxLayout *row, int width, TranslatableText caption);
+    /// The push button "Browse..." behind the field with that caption, and as high as it is.
+    QPushButton *addBrowseButton(QHBoxLayout *row, int width, TranslatableText caption,
+                                 const TextField *field);
     /// As high as the fields.
     void addAsField(QHBoxLayout *row, QWidget *widget);
 
@@ -55,18 +55,18 @@ protected:
     void resizeEvent(QResizeEvent *event) override;
 
 private:
-    std::optional<int> aroundFieldText_;
-    std::vector<QLineEdit *> fields_;
+    std::optional<int> fieldPadding_;
+    std::vector<TextField *> fields_;
     QFrame *panel_;
     QVBoxLayout *layout_;
     QVBoxLayout *rows_;
     QHBoxLayout *buttons_;
-    QSize besidePanel_; ///< What the dialog has more than the panel; a panel of its own otherwise.
+    QSize besidePanel_{0, 0}; ///< What the dialog has more than the panel.
 };
 
 /// Lets the user pick a file, beginning with the one that the field names, and puts its path into
 /// the field; a cancelled choice leaves the field as it is.
-void browseForFile(QLineEdit *field, QWidget *parent);
+void browseForFile(TextField *field, QWidget *parent);
 
 /// The same for a directory; the chooser is named "browse".
-void browseForDirectory(QLineEdit *field, QWidget *parent);
+void browseForDirectory(TextField *field, QWidget *parent);

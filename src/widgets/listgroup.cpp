@@ -1,7 +1,7 @@
 #include "widgets/listgroup.h"
 
 #include "widgets/captions.h"
-#include "widgets/leastsize.h"
+#include "widgets/minimumsize.h"
 
 #include <algorithm>
 
@@ -9,7 +9,7 @@ namespace {
 
 /// For a button in a group that shrinks.
 constexpr int buttonHeight = 22;
-constexpr int aroundButtonText = 2;
+constexpr int buttonPadding = 2;
 
 } // namespace
 
@@ -37,7 +37,7 @@ QPushButton *ListGroup::addButton(const char *caption) {
     if (column_->count() > 0) {
         addSpace(column_, groupSpacing, shrinking_);
     }
-    addOfHeight(column_, button, buttonHeight, aroundButtonText);
+    addOfHeight(column_, button, buttonHeight, buttonPadding);
     return button;
 }
 
@@ -46,7 +46,7 @@ void ListGroup::fixColumnWidth(int width) {
     for (int index = 0; index < column_->count(); ++index) {
         if (QWidget *widget = column_->itemAt(index)->widget()) {
             widgets.push_back(widget);
-            width = leastSize(widget, {width, buttonHeight}).width();
+            width = minimumSizeFor(widget, {width, buttonHeight}).width();
         }
     }
     for (QWidget *widget : widgets) {

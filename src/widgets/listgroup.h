@@ -30,23 +30,26 @@ public:
     /// text in it needs.
     void fixColumnWidth(int width);
 
-    /// Adds the three buttons that every list has and sends them, and a row that was chosen, to the
-    /// slots of `receiver`.
-    template <class Receiver, class AddSlot, class ModifySlot, class RemoveSlot, class SelectedSlot>
-    void addEditButtons(Receiver *receiver, AddSlot add, ModifySlot modify, RemoveSlot remove,
-                        SelectedSlot selected);
+    /// The slots that a list's three buttons, and a row that was chosen, lead to.
+    template <class Receiver>
+    struct EditSlots {
+        void (Receiver::*add)();
+        void (Receiver::*modify)();
+        void (Receiver::*remove)();
+        void (Receiver::*selected)(const char *);
+    };
+
+    /// Adds the three buttons that every list has.
+    template <class Receiver>
+    void addEditButtons(Receiver *receiver, const EditSlots<Receiver> &slotsOf) {
+        connect(addButton("Add..."), &QPushButton::clicked, receiver, slotsOf.add);
+        connect(addButton("Modify..."), &QPushButton::clicked, receiver, slotsOf.modify);
+        connect(addButton("Remove"), &QPushButton::clicked, receiver, slotsOf.remove);
+        connect(box_, &QListBox::selected, receiver, slotsOf.selected);
+    }
 
 private:
     QListBox *box_;
     QVBoxLayout *column_;
     Shrinking shrinking_;
 };
-
-template <class Receiver, class AddSlot, class ModifySlot, class RemoveSlot, class SelectedSlot>
-void ListGroup::addEditButtons(Receiver *receiver, AddSlot add, ModifySlot modify,
-                               RemoveSlot remove, SelectedSlot selected) {
-    connect(addButton("Add..."), &QPushButton::clicked, receiver, add);
-    connect(addButton("Modify..."), &QPushButton::clicked, receiver, modify);
-    connect(addButton("Remove"), &QPushButton::clicked, receiver, remove);
-    connect(box_, &QListBox::selected, receiver, selected);
-}

@@ -1,7 +1,7 @@
 #include "widgets/numberfield.h"
 
 #include "platform/knumericspinbox.h"
-#include "widgets/leastsize.h"
+#include "widgets/minimumsize.h"
 
 namespace {
 
@@ -9,12 +9,12 @@ constexpr int usualWidth = 60;
 
 } // namespace
 
-KNumericSpinBox *newNumberField(QWidget *parent, int lowest, int highest, int value) {
+KNumericSpinBox *newNumberField(QWidget *parent, int minimum, int maximum, int value) {
     auto *field = new KNumericSpinBox(parent);
-    field->setRange(lowest, highest);
+    field->setRange(minimum, maximum);
     field->setStep(1);
     field->setEditable(true);
     field->setValue(value);
-    field->setFixedWidth(leastSize(field, {usualWidth, 0}).width());
+    field->setFixedWidth(minimumSizeFor(field, {usualWidth, 0}).width());
     return field;
 }

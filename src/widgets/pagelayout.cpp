@@ -1,6 +1,6 @@
 #include "widgets/pagelayout.h"
 
-#include "widgets/leastsize.h"
+#include "widgets/minimumsize.h"
 
 #include <QWidget>
 
@@ -21,10 +21,10 @@ private:
 
 } // namespace
 
-void addOfHeight(QBoxLayout *layout, QWidget *widget, int height, std::optional<int> aroundText) {
-    const int full = leastSize(widget, {0, height}).height();
+void addOfHeight(QBoxLayout *layout, QWidget *widget, int height, std::optional<int> padding) {
+    const int full = minimumSizeFor(widget, {0, height}).height();
     widget->setMaximumHeight(full);
-    widget->setMinimumHeight(aroundText ? widget->fontMetrics().height() + *aroundText : full);
+    widget->setMinimumHeight(padding ? widget->fontMetrics().height() + *padding : full);
     if (QWidget *parent = layout->parentWidget()) {
         widget->setParent(parent);
     }

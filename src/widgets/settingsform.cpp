@@ -1,15 +1,13 @@
 #include "widgets/settingsform.h"
 
 #include "platform/knumericspinbox.h"
-#include "widgets/fieldtext.h"
-#include "widgets/fieldtip.h"
 #include "widgets/numberfield.h"
 #include "widgets/pagelayout.h"
+#include "widgets/textfield.h"
 
 #include <QCheckBox>
 #include <QHBoxLayout>
 #include <QLabel>
-#include <QLineEdit>
 
 SettingsForm::SettingsForm(QWidget *page, int labelWidth)
     : pageLayout_{newPageLayout(page)}, captions_{{labelWidth, 0}} {}
@@ -29,9 +27,9 @@ void SettingsForm::checkBox(const char *caption, BoolSetting &setting) {
     stores_.emplace_back([box, &setting] { setting.value = box->isChecked() ? 1 : 0; });
 }
 
-void SettingsForm::number(const char *caption, int lowest, int highest, NumberSetting &setting,
+void SettingsForm::number(const char *caption, int minimum, int maximum, NumberSetting &setting,
                           const char *note) {
-    KNumericSpinBox *box = newNumberField(group_, lowest, highest, setting.value);
+    KNumericSpinBox *box = newNumberField(group_, minimum, maximum, setting.value);
     QHBoxLayout *row = newRow(caption, box);
     if (note != nullptr) {
         auto *label = new QLabel(QString::fromUtf8(note), group_);
@@ -44,12 +42,12 @@ void SettingsForm::number(const char *caption, int lowest, int highest, NumberSe
 }
 
 void SettingsForm::text(const char *caption, TextSetting &setting) {
-    QLineEdit *field = newTextField(caption, setting.value.value_or(std::string{}));
+    TextField *field = newTextField(caption, setting.value.value_or(std::string{}));
     stores_.emplace_back([field, &setting] {
-        if (showsPartOnly(field)) {
+        if (field->showsPartOnly()) {
             return;
         }
-        const std::string bytes = fieldBytes(field);
+        const std::string bytes = field->bytes();
         if (setting.value || !bytes.empty()) {
             textSetting(setting.value, bytes);
         }
@@ -57,16 +55,16 @@ void SettingsForm::text(const char *caption, TextSetting &setting) {
 }
 
 void SettingsForm::accessList(const char *caption, AccessListSetting &setting) {
-    QLineEdit *field = newTextField(
+    TextField *field = newTextField(
         caption, accessListSetting(setting.value, std::nullopt).value_or(std::string{}));
     const QString syntax =
         QStringLiteral("\"all\", \"none\" or IPv4 addresses, with commas between them.\n"
                        "Behind an address: /8, /16, /24 or /32, or a blank and a mask.\n"
                        "Any other size is stored as one of these: 172.16.0.0/12 as 172.16.0.0/16.");
-    setFieldTip(field, syntax);
+    field->setToolTip(syntax);
     field->setAccessibleDescription(syntax);
     stores_.emplace_back(
-        [field, &setting] { accessListSetting(setting.value, fieldBytes(field)); });
+        [field, &setting] { accessListSetting(setting.value, field->bytes()); });
 }
 
 void SettingsForm::store() const {
@@ -89,9 +87,9 @@ QHBoxLayout *SettingsForm::newRow(const char *caption, QWidget *field) {
     return row;
 }
 
-QLineEdit *SettingsForm::newTextField(const char *caption, std::string_view bytes) {
-    QLineEdit *field = newField(group_);
-    showBytes(field, bytes);
+TextField *SettingsForm::newTextField(const char *caption, std::string_view bytes) {
+    TextField *field = new TextField(group_);
+    field->showBytes(bytes);
     newRow(caption, field);
     return field;
 }

@@ -10,8 +10,8 @@
 
 class QGroupBox;
 class QHBoxLayout;
-class QLineEdit;
 class QWidget;
+class TextField;
 
 /// The groups of captions and fields on a page that edit settings. Each row names its widget and
 /// its setting once: it is filled when it is made, and `store` hands it back. A caption's "&" marks
@@ -26,7 +26,7 @@ public:
     void checkBox(const char *caption, BoolSetting &setting);
     /// `note`, where given, stands behind the field. A stored number outside the range stays as it
     /// is until the user changes it.
-    void number(const char *caption, int lowest, int highest, NumberSetting &setting,
+    void number(const char *caption, int minimum, int maximum, NumberSetting &setting,
                 const char *note = nullptr);
     /// A field left empty keeps an absent text absent.
     void text(const char *caption, TextSetting &setting);
@@ -41,7 +41,7 @@ public:
 private:
     QHBoxLayout *newRow();
     QHBoxLayout *newRow(const char *caption, QWidget *field);
-    QLineEdit *newTextField(const char *caption, std::string_view bytes);
+    TextField *newTextField(const char *caption, std::string_view bytes);
 
     QVBoxLayout *pageLayout_;
     QVBoxLayout *groupLayout_ = nullptr;

@@ -1,4 +1,4 @@
-#include "widgets/leastsize.h"
+#include "widgets/minimumsize.h"
 
 #include <QPushButton>
 #include <QSpinBox>
@@ -10,21 +10,21 @@
 namespace {
 
 /// What a line edit inside a number field keeps free before the number.
-constexpr int editMargin = 2;
+constexpr int editPadding = 2;
 
 /// What a button that has to grow leaves free on either side of its text.
-constexpr int besideButtonText = 4;
+constexpr int buttonPadding = 4;
 
 /// Of a push button the toolkit's own hint is wider than its text needs.
 QSize forButton(const QPushButton *button, QSize given) {
     QStyleOptionButton option;
     option.initFrom(button);
     option.rect = {{}, given};
-    const QSize room =
+    const QSize available =
         button->style()->subElementRect(QStyle::SE_PushButtonContents, &option, button).size();
     const QSize text = button->fontMetrics().size(Qt::TextShowMnemonic, button->text());
-    const QSize beside{text.width() > room.width() ? 2 * besideButtonText : 0, 0};
-    return given - room + text + beside;
+    const QSize padding{text.width() > available.width() ? 2 * buttonPadding : 0, 0};
+    return given - available + text + padding;
 }
 
 /// All numbers between the ends have no more digits than one of them.
@@ -33,7 +33,7 @@ QSize forNumbers(const QSpinBox *box, QSize given) {
     option.initFrom(box);
     option.frame = box->hasFrame();
     option.rect = {{}, QSize{given.width(), 2 * box->fontMetrics().height()}};
-    const int room =
+    const int available =
         box->style()
             ->subControlRect(QStyle::CC_SpinBox, &option, QStyle::SC_SpinBoxEditField, box)
             .width();
@@ -41,7 +41,7 @@ QSize forNumbers(const QSpinBox *box, QSize given) {
         return box->fontMetrics().horizontalAdvance(QString::number(number));
     };
     const int text = std::max(widthOf(box->minimum()), widthOf(box->maximum()));
-    return {given.width() - room + editMargin + text,
+    return {given.width() - available + editPadding + text,
             given.height() == 0 ? 0 : box->minimumSizeHint().height()};
 }
 
@@ -57,7 +57,7 @@ QSize needed(const QWidget *widget, QSize given) {
 
 } // namespace
 
-QSize leastSize(const QWidget *widget, QSize given) {
+QSize minimumSizeFor(const QWidget *widget, QSize given) {
     const QSize text = needed(widget, given);
     return {given.width() == 0 ? 0 : std::max(given.width(), text.width()),
             given.height() == 0 ? 0 : std::max(given.height(), text.height())};

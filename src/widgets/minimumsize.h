@@ -8,4 +8,4 @@ class QWidget;
 /// into them, and otherwise grow to what the text needs with the widget's font and style. Serves
 /// labels, buttons, check boxes, number fields, line edits and combo boxes; a given length of 0
 /// stands for none.
-QSize leastSize(const QWidget *widget, QSize given);
+QSize minimumSizeFor(const QWidget *widget, QSize given);

@@ -1,0 +1,176 @@
+#include "widgets/textfield.h"
+
+#include "platform/bytetext.h"
+
+#include <QEvent>
+#include <QScreen>
+#include <QToolTip>
+#include <QValidator>
+
+#include <algorithm>
+
+namespace {
+
+constexpr std::size_t bytesShownOfLonger = 1'000;
+
+/// How far below the point that it is shown for the toolkit puts a tip: the height of a pointer.
+constexpr int maximumBelowPoint = 32;
+/// The tip's frame and margins on both sides together.
+constexpr int tipPadding = 12;
+
+std::size_t byteCount(QStringView text) { return bytesFromText(text).size(); }
+
+} // namespace
+
+class TextField::Validator : public QValidator {
+public:
+    using QValidator::QValidator;
+
+    void setShown(const QString &text) { shown_ = text; }
+    void setRule(const FieldRule &rule) { rule_ = rule; }
+
+    State validate(QString &input, int &position) const override {
+        refusal_ = rule_.toolTip;
+        const QString first = input.left(1);
+        if ((!first.isEmpty() && first != shown_.left(1) && rule_.refusedFirst.contains(first)) ||
+            std::ranges::any_of(input, [this](QChar character) {
+                return rule_.refused.contains(character) && !shown_.contains(character);
+            })) {
+            return Invalid;
+        }
+        if (rule_.maximumBytes > 0) {
+            cutToFit(input, position);
+        }
+        if (isTooLong(input)) {
+            refusal_ = lengthRule(maximumBytes).toolTip;
+            return Invalid;
+        }
+        return Acceptable;
+    }
+
+    /// Why the last text was refused that was.
+    [[nodiscard]] const QString &refusal() const { return refusal_; }
+
+private:
+    /// The bytes are counted only where there may be too many: no character has more than four,
+    /// and those of four count as two.
+    static bool isTooLong(const QString &input) {
+        return 3 * static_cast<std::size_t>(input.size()) > maximumBytes &&
+               byteCount(input) > maximumBytes;
+    }
+
+    /// What was put in ends at `position`: there it is cut, so that nothing that stood in the field
+    /// before is pushed out. What was shown longer may be edited, but not grow.
+    void cutToFit(QString &input, int &position) const {
+        const std::size_t maximum = std::max(rule_.maximumBytes, byteCount(shown_));
+        std::size_t count = byteCount(input);
+        int kept = position;
+        while (count > maximum && kept > 0) {
+            const bool isPair = kept > 1 && input.at(kept - 1).isLowSurrogate() &&
+                                input.at(kept - 2).isHighSurrogate();
+            const int length = isPair ? 2 : 1;
+            kept -= length;
+            count -= byteCount(QStringView{input}.mid(kept, length));
+        }
+        input.remove(kept, position - kept);
+        position = kept;
+    }
+
+    FieldRule rule_;
+    QString shown_; ///< By the program; what it holds may stay.
+    mutable QString refusal_;
+};
+
+FieldRule lengthRule(std::size_t maximumBytes) {
+    return {.maximumBytes = maximumBytes,
+            .toolTip = QStringLiteral("At most %1 bytes").arg(maximumBytes)};
+}
+
+TextField::TextField(QWidget *parent) : QLineEdit(parent), validator_{new Validator(this)} {
+    // The edit cuts beyond this, which the rule then refuses: every character is a byte or more.
+    setMaxLength(static_cast<int>(maximumBytes) + 1);
+    setValidator(validator_);
+    connect(this, &QLineEdit::inputRejected, this, [this] { showTip(validator_->refusal()); });
+}
+
+void TextField::showBytes(std::string_view bytes) {
+    const bool isTooLong = bytes.size() > maximumBytes;
+    const QString shown =
+        textFromBytes(bytes.substr(0, isTooLong ? bytesShownOfLonger : bytes.size()));
+    validator_->setShown(shown);
+    setText(shown);
+    setCursorPosition(0);
+    setReadOnly(isTooLong);
+    if (isTooLong) {
+        setToolTip(QStringLiteral("Too long to be edited here: this is its beginning"));
+    }
+}
+
+void TextField::setRule(const FieldRule &rule) {
+    validator_->setRule(rule);
+    if (!rule.toolTip.isEmpty() && !showsPartOnly()) {
+        setToolTip(rule.toolTip);
+    }
+}
+
+std::string TextField::bytes() const {
+    std::string bytes = bytesFromText(text());
+    std::ranges::replace_if(
+        bytes, [](char byte) { return byte == '\r' || byte == '\n' || byte == '\0'; }, ' ');
+    return bytes;
+}
+
+KeptText TextField::keptText(KeptText before) const {
+    if (showsPartOnly()) {
+        return before;
+    }
+    const std::string typed = bytes();
+    return typed == std::string_view{before} ? before : keep(typed);
+}
+
+bool TextField::holdsRefusedText() {
+    QString accepted = text();
+    int position = static_cast<int>(accepted.size());
+    if (showsPartOnly() || (validator_->validate(accepted, position) == QValidator::Acceptable &&
+                            accepted == text())) {
+        return false;
+    }
+    showTip(validator_->refusal());
+    return true;
+}
+
+void TextField::replaceText(const QString &text) {
+    if (showsPartOnly()) {
+        return;
+    }
+    const QString before = this->text();
+    setText(text);
+    if (this->text() != text) { // It was cut, and would lead elsewhere.
+        showTip(validator_->refusal());
+    } else if (!holdsRefusedText()) {
+        return;
+    }
+    setText(before);
+}
+
+void TextField::showTip(const QString &tip) const {
+    const QRect frame = window()->frameGeometry();
+    const QRect available = screen()->availableGeometry();
+    const QSize size = QFontMetrics{QToolTip::font()}.size(0, tip) + QSize{tipPadding, tipPadding};
+    const QPoint field = mapToGlobal(QPoint{0, 0});
+    QPoint at{field.x(), frame.top() - maximumBelowPoint - size.height()};
+    if (frame.right() + tipPadding + size.width() <= available.right()) {
+        at = {frame.right(), field.y() - maximumBelowPoint / 2};
+    } else if (frame.bottom() + maximumBelowPoint + size.height() <= available.bottom()) {
+        at = {field.x(), frame.bottom()};
+    }
+    QToolTip::showText(at, tip);
+}
+
+bool TextField::event(QEvent *event) {
+    if (event->type() == QEvent::ToolTip && !toolTip().isEmpty()) {
+        showTip(toolTip());
+        return true;
+    }
+    return QLineEdit::event(event);
+}
