@@ -18,7 +18,6 @@
 #include "server/smtprejectfile.h"
 
 #include <array>
-#include <new>
 
 namespace {
 
@@ -31,14 +30,12 @@ void readFiles() {
 }
 
 /// A signal that ends the program does so between two applies, not between two files.
-void writeFiles(bool areSettingsStored) {
+void writeFiles() {
     const EndSignalsHeld held;
     writeAliasFile();
     writeSmtpRejectFile();
     writeMailListFile();
-    if (areSettingsStored) {
-        writeMasterConfig();
-    }
+    writeMasterConfig();
 }
 
 template <class Page>
@@ -97,17 +94,12 @@ KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
 }
 
 void KTarvexApplication::applyChanges() {
-    bool areSettingsStored = true;
     for (const std::size_t index : storeOrder) {
-        try {
-            if (KConfigWidget *page = pages_.at(index)) {
-                page->storeValues();
-            }
-        } catch (const std::bad_alloc &) { // What a page could not store is still in its fields.
-            areSettingsStored = false;
+        if (KConfigWidget *page = pages_.at(index)) {
+            page->storeValues();
         }
     }
-    writeFiles(areSettingsStored);
+    writeFiles();
     // What the command reports is its own business; the files are written whatever it says.
     runShellCommand(productPaths().reconfigureCommand);
 }

@@ -58,12 +58,8 @@ void MailFetch::MailFetchModify() { fetchers_.changeCurrent(); }
 
 void MailFetch::MailFetchRead(pop_host *host, EditFetch *dialog) {
     if (host != nullptr && dialog != nullptr) {
-        // All three are there before one is changed, should memory run out.
-        const std::string server = dialog->server();
-        const std::string user = dialog->user();
-        const std::string password = dialog->password();
-        setPopHostText(host->server, server);
-        setPopHostText(host->user, user);
-        setPopHostText(host->password, password);
+        setPopHostText(host->server, dialog->server());
+        setPopHostText(host->user, dialog->user());
+        setPopHostText(host->password, dialog->password());
     }
 }

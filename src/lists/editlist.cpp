@@ -181,9 +181,8 @@ TextField *EditList::addText(QHBoxLayout *row, TranslatableText caption, Caption
                              KeptText maillist_fields::*field, const maillist_entry &list) {
     TextField *edit = addField(row, caption, captions, list.*field);
     edit->setRule(lengthRule(mostBytesOf(field)));
-    stores_.emplace_back([edit, field](maillist_fields &fields) {
-        fields.*field = edit->keptText(fields.*field);
-    });
+    stores_.emplace_back(
+        [edit, field](maillist_fields &fields) { fields.*field = edit->keptText(fields.*field); });
     return edit;
 }
 

@@ -11,7 +11,6 @@
 #include <QPushButton>
 
 #include <algorithm>
-#include <new>
 
 // What the buttons of the editor do to any of its lists; its window is made in editlist.cpp.
 
@@ -72,24 +71,21 @@ void EditList::Load(QListBox *box, maillist_addr_entry **chain) {
     if (dialog.exec() != QDialog::Accepted) {
         return;
     }
-    try {
-        const FileRead file = readWholeFile(dialog.fileName());
-        if (!file.bytes) {
-            showUnreadable(this);
-            return;
-        }
-        AddressChain loaded = parseAddressLines(*file.bytes);
-        std::vector<KeptText> rows;
-        for (const maillist_addr_entry &address : loaded) {
-            rows.push_back(address.addr);
-        }
-        std::ranges::reverse(rows); // The file's first address is the chain's last.
-        box->append(rows);
-        prependChain(chain, std::move(loaded));
-        if (!rows.empty()) {
-            box->showRow(box->count() - 1);
-        }
-    } catch (const std::bad_alloc &) { // Then nothing is loaded, rather than a part.
+    const FileRead file = readWholeFile(dialog.fileName());
+    if (!file.bytes) {
+        showUnreadable(this);
+        return;
+    }
+    AddressChain loaded = parseAddressLines(*file.bytes);
+    std::vector<KeptText> rows;
+    for (const maillist_addr_entry &address : loaded) {
+        rows.push_back(address.addr);
+    }
+    std::ranges::reverse(rows); // The file's first address is the chain's last.
+    box->append(rows);
+    prependChain(chain, std::move(loaded));
+    if (!rows.empty()) {
+        box->showRow(box->count() - 1);
     }
 }
 

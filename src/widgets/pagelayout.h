@@ -22,8 +22,8 @@ inline void addSpace(QVBoxLayout *layout, int height, Shrinking shrinking) {
 }
 
 /// Adds a widget, and makes it the layout's widget's child. It is `height` pixels high, or as high
-/// as its text needs. With `padding` it grows lower where the window is too low, but keeps that many
-/// pixels more than its font's height.
+/// as its text needs. With `padding` it grows lower where the window is too low, but keeps that
+/// many pixels more than its font's height.
 void addOfHeight(QBoxLayout *layout, QWidget *widget, int height,
                  std::optional<int> padding = std::nullopt);
 

@@ -63,8 +63,7 @@ void SettingsForm::accessList(const char *caption, AccessListSetting &setting) {
                        "Any other size is stored as one of these: 172.16.0.0/12 as 172.16.0.0/16.");
     field->setToolTip(syntax);
     field->setAccessibleDescription(syntax);
-    stores_.emplace_back(
-        [field, &setting] { accessListSetting(setting.value, field->bytes()); });
+    stores_.emplace_back([field, &setting] { accessListSetting(setting.value, field->bytes()); });
 }
 
 void SettingsForm::store() const {
