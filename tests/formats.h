@@ -29,8 +29,8 @@ inline std::string decoded(std::string text) {
     return text;
 }
 
-/// The rows of a section, which has a name like "[aliases]"; throws where the list has none such, or
-/// a line in it that is no row.
+/// The rows of a section, whose name is like "[aliases]"; throws where the list has none such, or a
+/// line in it that is no row.
 inline std::vector<FormatRow> formatRows(const std::string &path, std::string_view section) {
     std::ifstream list{path};
     std::string line;
