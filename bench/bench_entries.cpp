@@ -23,15 +23,13 @@
 #include <array>
 #include <cmath>
 #include <cstdio>
+#include <cstdlib>
 #include <ctime>
-#include <filesystem>
 #include <functional>
 #include <sys/mman.h>
 #include <sys/resource.h>
 #include <sys/wait.h>
 #include <unistd.h>
-
-namespace fs = std::filesystem;
 
 namespace {
 
@@ -202,17 +200,15 @@ const std::vector<Format> &formats() {
 
 /// With one file of a million entries, say, and the others empty.
 void layProduct(const std::string &path = {}, std::string_view bytes = {}) {
-    fs::remove_all(product);
-    fs::create_directories(product + "/config/templates");
-    fs::create_directories(product + "/bin");
+    if (std::system(LAY_PRODUCT) != 0) {
+        std::abort();
+    }
     const std::string paths = "%mail.file.alias: " + aliasPath +
                               "\n%mail.file.smtpreject: " + rejectPath +
                               "\n%mail.file.maillist: " + listPath + "\n";
     rewriteFile(productPaths().master, paths);
     rewriteFile(productPaths().masterTemplate,
                 paths + "%pop.hosts:\n%mail.domains:\n%smtp.sock.port: 25\n");
-    rewriteFile(product + "/bin/tvxreconf", std::string_view{"#!/bin/sh\n"});
-    fs::permissions(product + "/bin/tvxreconf", fs::perms::owner_all);
     if (!path.empty()) {
         rewriteFile(path, bytes);
     }
