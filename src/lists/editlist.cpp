@@ -136,12 +136,12 @@ EditList::EditList(QWidget *parent, const char *name, const maillist_entry *list
     sides->addLayout(newSide({members_, allowed_, blocked_}), 300);
     rows()->addWidget(columns);
     addButtons(pageBorder, pageBorder, Shrinking::Yes);
-    const QSize room = roomFor(this);
-    if (!fitsInto(room, layout()->totalMinimumSize())) {
+    const QSize available = availableSize(this);
+    if (!fitsInto(available, layout()->totalMinimumSize())) {
         rows()->addWidget(scrolling(columns));
     }
-    setMinimumSize(leastWindow.expandedTo(layout()->totalMinimumSize()).boundedTo(room));
-    resize(layout()->totalSizeHint().boundedTo(room));
+    setMinimumSize(leastWindow.expandedTo(layout()->totalMinimumSize()).boundedTo(available));
+    resize(layout()->totalSizeHint().boundedTo(available));
 }
 
 QGroupBox *EditList::newTexts(const maillist_entry &list) {
