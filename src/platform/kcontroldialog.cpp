@@ -1,8 +1,8 @@
 #include "platform/kcontroldialog.h"
 
+#include "platform/droppedinput.h"
 #include "platform/helpkey.h"
 #include "platform/helpwindow.h"
-#include "platform/kapplication.h"
 #include "platform/kconfigwidget.h"
 #include "platform/lowscreen.h"
 
@@ -120,5 +120,5 @@ void KControlDialog::apply() {
     QApplication::setOverrideCursor(Qt::WaitCursor);
     emit applied();
     QApplication::restoreOverrideCursor();
-    KApplication::dropPendingInput();
+    dropPendingInput();
 }
