@@ -150,7 +150,7 @@ EditList::EditList(QWidget *parent, const char *name, const maillist_entry *list
     sides->addLayout(newSide(groups_), 300);
     rows()->addWidget(columns);
     addButtons(pageBorder, pageBorder, Shrinking::Yes);
-    const QSize available = roomFor(this);
+    const QSize available = availableSize(this);
     if (!fitsInto(available, layout()->totalMinimumSize())) {
         rows()->addWidget(scrolling(columns));
     }

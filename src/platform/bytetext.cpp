@@ -12,11 +12,14 @@ struct SequenceForm {
     unsigned char leadMask;
     unsigned char lead;
     std::size_t length;
-    char32_t smallest; ///< A smaller code point in this form is an overlong one: not valid.
+    char32_t minimum; ///< A smaller code point in this form is an overlong one: not valid.
 };
 
 constexpr std::array<SequenceForm, 4> sequenceForms{
-    {{0x80, 0x00, 1, 0}, {0xe0, 0xc0, 2, 0x80}, {0xf0, 0xe0, 3, 0x800}, {0xf8, 0xf0, 4, 0x10000}}};
+    {{.leadMask = 0x80, .lead = 0x00, .length = 1, .minimum = 0},
+     {.leadMask = 0xe0, .lead = 0xc0, .length = 2, .minimum = 0x80},
+     {.leadMask = 0xf0, .lead = 0xe0, .length = 3, .minimum = 0x800},
+     {.leadMask = 0xf8, .lead = 0xf0, .length = 4, .minimum = 0x10000}}};
 
 struct Decoded {
     char32_t codePoint = 0;
@@ -38,7 +41,7 @@ Decoded decodeFirst(std::string_view bytes) {
             }
             codePoint = (codePoint << 6) | (byteAt(index) & 0x3f);
         }
-        if (codePoint < form.smallest || codePoint > 0x10ffff || QChar::isSurrogate(codePoint)) {
+        if (codePoint < form.minimum || codePoint > 0x10ffff || QChar::isSurrogate(codePoint)) {
             return {};
         }
         return {codePoint, form.length};

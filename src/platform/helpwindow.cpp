@@ -30,7 +30,7 @@ HelpWindow::HelpWindow(QString folder)
     : folder_{std::move(folder)}, browser_{new QTextBrowser(this)} {
     const QString help = QCoreApplication::translate("QPlatformTheme", "Help");
     setWindowTitle(help);
-    resize(QSize{640, 560}.boundedTo(roomFor(this)));
+    resize(QSize{640, 560}.boundedTo(availableSize(this)));
     browser_->setAccessibleName(help);
     browser_->setOpenLinks(false);
     auto *close = new QPushButton(QCoreApplication::translate("QPlatformTheme", "Close"), this);

@@ -10,7 +10,7 @@ public:
     /// `name` becomes the object name.
     KConfigWidget(QWidget *parent, const char *name) : QWidget(parent) { setObjectName(name); }
 
-    /// Fills the widgets anew.
+    /// Does nothing: a page's constructor fills its widgets.
     virtual void loadValues() {}
     /// Hands what the widgets hold to the program's memory; the application calls it at apply.
     virtual void storeValues() {}

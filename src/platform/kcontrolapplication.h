@@ -1,5 +1,6 @@
 #pragma once
 
+#include "platform/commandline.h"
 #include "platform/kapplication.h"
 
 #include <string>
@@ -10,12 +11,8 @@ class KControlDialog;
 class QWidget;
 
 /// The application base of a control module: the command line, the tabbed dialog with its buttons,
-/// help and the event loop.
-///
-/// Command line: "-init" (or "--init") is the init-only mode, which needs no display; "-h" and "-v"
-/// (or "--help" and "--version") print and end the process with 0. Every other argument names a
-/// page. An unknown option, and a name that is none of the application's pages, end the process
-/// with 2 and one line on standard error. All this comes before a display is looked for.
+/// help and the event loop. The command line is answered before a display is looked for; its
+/// init-only mode needs none.
 class KControlApplication : public KApplication {
 public:
     /// `pageNames` are the names that the command line may ask for.
@@ -51,12 +48,6 @@ protected:
     void showDialog();
 
 private:
-    struct CommandLine {
-        bool initOnly = false;
-        std::vector<std::string> pages; ///< Empty when all pages are wanted.
-    };
-    static CommandLine parseCommandLine(int argc, char **argv, const char *name,
-                                        const std::vector<const char *> &pageNames);
     KControlApplication(const char *program, const char *name, CommandLine commandLine);
 
     std::vector<std::string> requestedPages_;

@@ -1,8 +1,8 @@
 #include "platform/kcontroldialog.h"
 
+#include "platform/droppedinput.h"
 #include "platform/helpkey.h"
 #include "platform/helpwindow.h"
-#include "platform/kapplication.h"
 #include "platform/kconfigwidget.h"
 #include "platform/lowscreen.h"
 
@@ -100,8 +100,8 @@ QWidget *KControlDialog::fieldOf(const QKeySequence &shortcut) const {
 }
 
 void KControlDialog::fitToScreen() {
-    const QSize room = roomFor(this);
-    if (fitsInto(room, layout_->totalMinimumSize())) {
+    const QSize available = availableSize(this);
+    if (fitsInto(available, layout_->totalMinimumSize())) {
         return;
     }
     tabs_->setUsesScrollButtons(true);
@@ -112,7 +112,7 @@ void KControlDialog::fitToScreen() {
     }
     tabs_->setCurrentIndex(0);
     tabs_->updateGeometry(); // It forgets to, as long as it is not shown.
-    resize(wanted.boundedTo(room));
+    resize(wanted.boundedTo(available));
 }
 
 void KControlDialog::apply() {
@@ -120,5 +120,5 @@ void KControlDialog::apply() {
     QApplication::setOverrideCursor(Qt::WaitCursor);
     emit applied();
     QApplication::restoreOverrideCursor();
-    KApplication::dropPendingInput();
+    dropPendingInput();
 }

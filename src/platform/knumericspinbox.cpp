@@ -13,10 +13,10 @@ KNumericSpinBox::KNumericSpinBox(QWidget *parent) : QSpinBox(parent) {
     connect(this, &QSpinBox::valueChanged, this, &KNumericSpinBox::confine);
 }
 
-void KNumericSpinBox::setRange(int lowest, int highest) {
-    lowest_ = lowest;
-    highest_ = highest;
-    QSpinBox::setRange(lowest, highest);
+void KNumericSpinBox::setRange(int minimum, int maximum) {
+    minimum_ = minimum;
+    maximum_ = maximum;
+    QSpinBox::setRange(minimum, maximum);
 }
 
 void KNumericSpinBox::setStep(int step) { setSingleStep(step); }
@@ -27,11 +27,11 @@ void KNumericSpinBox::setValue(int value) {
     stored_ = value;
     {
         const QSignalBlocker noChangeYet{this};
-        QSpinBox::setRange(std::min(lowest_, value), std::max(highest_, value));
+        QSpinBox::setRange(std::min(minimum_, value), std::max(maximum_, value));
     }
     QSpinBox::setValue(value);
     // The field is made for the range; a number with more digits may not be seen whole in it.
-    setToolTip(value < lowest_ || value > highest_ ? text() : QString{});
+    setToolTip(value < minimum_ || value > maximum_ ? text() : QString{});
 }
 
 int KNumericSpinBox::getValue() const { return value(); }
@@ -49,7 +49,7 @@ void KNumericSpinBox::wheelEvent(QWheelEvent *event) {
 
 void KNumericSpinBox::confine(int value) {
     if (value != stored_) {
-        QSpinBox::setRange(lowest_, highest_);
+        QSpinBox::setRange(minimum_, maximum_);
         setToolTip({});
     }
 }

@@ -12,7 +12,7 @@ public:
     explicit KNumericSpinBox(QWidget *parent = nullptr);
 
     /// To be called before setValue; both ends belong to the range.
-    void setRange(int lowest, int highest);
+    void setRange(int minimum, int maximum);
     void setStep(int step);
     void setValue(int value);
     [[nodiscard]] int getValue() const;
@@ -25,7 +25,7 @@ protected:
 private:
     void confine(int value);
 
-    int lowest_ = 0;
-    int highest_ = 0;
+    int minimum_ = 0;
+    int maximum_ = 0;
     int stored_ = 0;
 };

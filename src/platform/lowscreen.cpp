@@ -6,12 +6,12 @@
 
 namespace {
 
-/// What window managers commonly put around a window.
+/// What window managers commonly add to a window.
 constexpr QSize usualFrame{8, 30};
 
 } // namespace
 
-QSize roomFor(const QWidget *window) {
+QSize availableSize(const QWidget *window) {
     return window->screen()->availableGeometry().size() - usualFrame;
 }
 

@@ -7,10 +7,12 @@ class QWidget;
 
 /// The largest size, in pixels, that the window can have on its screen beside panels and inside the
 /// window manager's frame, as far as that is known before the window is shown.
-QSize roomFor(const QWidget *window);
+QSize availableSize(const QWidget *window);
 
 /// Whether both the width and the height fit.
-inline bool fitsInto(QSize room, QSize window) { return window.boundedTo(room) == window; }
+inline bool fitsInto(QSize available, QSize window) {
+    return window.boundedTo(available) == window;
+}
 
 /// A frameless area of the content's own size in which it scrolls where it is given less.
 QScrollArea *scrolling(QWidget *content);

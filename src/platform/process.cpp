@@ -1,28 +1,35 @@
 #include "platform/process.h"
 
+#include <array>
+#include <atomic>
+#include <csignal>
 #include <cstdlib>
 #include <fcntl.h>
-#include <malloc.h>
 #include <unistd.h>
 
 namespace {
 
-constexpr std::array<int, 3> endSignals{SIGTERM, SIGINT, SIGHUP};
+std::atomic<unsigned> arrived{0}; ///< A bit for each signal that waits.
 
-/// A write into a pipe that nobody reads, or past the file size limit, then fails like any other.
-constexpr std::array<int, 2> writeSignals{SIGPIPE, SIGXFSZ};
+void hold(int signal) { arrived |= 1U << signal; }
 
-/// What the process was started with.
-std::array<struct sigaction, writeSignals.size()> startActions{};
-bool isPrepared = false;
+struct SignalHandler {
+    int signal;
+    void (*other)(int); ///< That which is not in use.
+};
 
-std::array<volatile std::sig_atomic_t, endSignals.size()> arrived{};
+// Where they are ignored, the write fails like any other.
+std::array<SignalHandler, 2> writeSignals{{{SIGPIPE, SIG_IGN}, {SIGXFSZ, SIG_IGN}}};
 
-void hold(int signal) {
-    for (std::size_t index = 0; index < endSignals.size(); ++index) {
-        if (endSignals.at(index) == signal) {
-            arrived.at(index) = 1;
-        }
+// Caught rather than blocked: a blocked signal would still reach one of the toolkit's threads and
+// end the process there.
+std::array<SignalHandler, 3> endSignals{{{SIGTERM, hold}, {SIGINT, hold}, {SIGHUP, hold}}};
+
+/// Puts the other handlers to use.
+template <std::size_t count>
+void exchange(std::array<SignalHandler, count> &handlers) {
+    for (auto &[signal, other] : handlers) {
+        other = std::signal(signal, other);
     }
 }
 
@@ -36,50 +43,23 @@ void prepareProcess() {
             [[maybe_unused]] const int opened = ::open("/dev/null", O_RDWR);
         }
     }
-    // A heap for each of the toolkit's threads would set aside 128 MB of address space for itself.
-    ::mallopt(M_ARENA_MAX, 1);
-    struct sigaction ignore = {};
-    ignore.sa_handler = SIG_IGN;
-    for (std::size_t index = 0; index < writeSignals.size(); ++index) {
-        ::sigaction(writeSignals.at(index), &ignore, &startActions.at(index));
-    }
-    isPrepared = true;
+    exchange(writeSignals);
 }
 
 void runShellCommand(const char *command) {
-    std::array<struct sigaction, writeSignals.size()> now{};
-    for (std::size_t index = 0; isPrepared && index < writeSignals.size(); ++index) {
-        ::sigaction(writeSignals.at(index), &startActions.at(index), &now.at(index));
-    }
+    exchange(writeSignals);
     [[maybe_unused]] const int status = std::system(command);
-    for (std::size_t index = 0; isPrepared && index < writeSignals.size(); ++index) {
-        ::sigaction(writeSignals.at(index), &now.at(index), nullptr);
-    }
+    exchange(writeSignals);
 }
 
-// A blocked signal would still reach one of the toolkit's threads and end the process there: each
-// is caught instead, whichever thread gets it.
-
-EndSignalsHeld::EndSignalsHeld() {
-    struct sigaction caught = {};
-    caught.sa_handler = hold;
-    caught.sa_flags = SA_RESTART;
-    for (std::size_t index = 0; index < endSignals.size(); ++index) {
-        arrived.at(index) = 0;
-        ::sigaction(endSignals.at(index), nullptr, &before_.at(index));
-        if (before_.at(index).sa_handler != SIG_IGN) {
-            ::sigaction(endSignals.at(index), &caught, nullptr);
-        }
-    }
-}
+EndSignalsHeld::EndSignalsHeld() { exchange(endSignals); }
 
 EndSignalsHeld::~EndSignalsHeld() {
-    for (std::size_t index = 0; index < endSignals.size(); ++index) {
-        ::sigaction(endSignals.at(index), &before_.at(index), nullptr);
-    }
-    for (std::size_t index = 0; index < endSignals.size(); ++index) {
-        if (arrived.at(index) != 0) {
-            [[maybe_unused]] const int result = std::raise(endSignals.at(index));
+    exchange(endSignals);
+    const unsigned waiting = arrived.exchange(0);
+    for (const auto &[signal, other] : endSignals) {
+        if ((waiting & 1U << signal) != 0) {
+            [[maybe_unused]] const int result = std::raise(signal);
         }
     }
 }

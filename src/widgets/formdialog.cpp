@@ -26,7 +26,7 @@ bool isWholePath(const QString &path) {
 
 void browse(TextField *field, QFileDialog &chooser) {
     addHelpKey(&chooser);
-    chooser.resize(chooser.sizeHint().boundedTo(roomFor(&chooser)));
+    chooser.resize(chooser.sizeHint().boundedTo(availableSize(&chooser)));
     chooser.setWindowModality(Qt::WindowModal); // The help stays usable here as well.
     if (field->showsPartOnly() || chooser.exec() != QDialog::Accepted) {
         return;
