@@ -165,7 +165,7 @@ QGroupBox *EditList::newTexts(const maillist_entry &list) {
 QLineEdit *EditList::addText(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
                              KeptText maillist_entry::*field, const maillist_entry &list) {
     QLineEdit *edit = addField(row, caption, captions, list.*field);
-    applyRule(edit, lengthRule(mostBytesOf(field)));
+    applyRule(edit, lengthRule(maximumBytesOf(field)));
     stores_.emplace_back(
         [edit, field](maillist_entry &record) { record.*field = fieldText(edit, record.*field); });
     return edit;
