@@ -17,8 +17,8 @@ namespace {
 KeptText placed(std::string_view bytes) {
     constexpr std::size_t places = 4;
     constexpr std::size_t placeSize = 1 << 18;
-    static auto *const memory = new char[places * placeSize];
-    static const KeptText all = keep({std::unique_ptr<char[]>{memory}, places * placeSize});
+    static const KeptText all = keep(std::string(places * placeSize, '\0'));
+    static auto *const memory = const_cast<char *>(all.data());
     static std::size_t next = 0;
     require(bytes.size() <= placeSize, "an input of 4 kB makes no file of 256 kB");
     const std::size_t begin = next++ % places * placeSize;
@@ -31,7 +31,7 @@ KeptText placed(std::string_view bytes) {
 template <class Record>
 struct Format {
     void (*parse)(KeptText, RecordChain<Record> &);
-    void (*format)(const RecordChain<Record> &, ByteSink &);
+    void (*format)(const RecordChain<Record> &, std::string &);
     std::string (*shown)(const Record &); ///< All that a record holds.
 
     [[nodiscard]] RecordChain<Record> read(std::string_view bytes) const {
@@ -40,7 +40,9 @@ struct Format {
         return list;
     }
     [[nodiscard]] RecordChain<Record> readAgain(const RecordChain<Record> &list) const {
-        return read(formatted([&](ByteSink &sink) { format(list, sink); }));
+        std::string bytes;
+        format(list, bytes);
+        return read(bytes);
     }
     /// Records are compared: what the writer forgets is in no text of its own.
     void requireSame(const RecordChain<Record> &list, const RecordChain<Record> &other) const {
@@ -162,8 +164,9 @@ std::string settledText(Setting *setting) {
 }
 
 std::string filled(std::string_view masterTemplate) {
-    const std::vector<MasterLine> lines = masterLines(masterTemplate);
-    return formatted([&](ByteSink &sink) { formatMasterConfig(lines, sink); });
+    std::string bytes;
+    formatMasterConfig(masterTemplate, bytes);
+    return bytes;
 }
 
 void readAnew(const std::vector<Setting *> &known, std::string_view masterFile) {
@@ -262,7 +265,7 @@ void rejects(std::string_view bytes) {
 }
 
 void loadedlines(std::string_view bytes) {
-    const AddressChain loaded = parseAddressLines(bytes);
+    const AddressChain loaded = parseAddressLines(placed(bytes));
     std::vector<std::string_view> texts = inputOrder(loaded, &maillist_addr_entry::addr);
     requireParts(texts, bytes);
     std::string lines;
@@ -271,7 +274,7 @@ void loadedlines(std::string_view bytes) {
     }
     // An "@" may have stood behind a carriage return.
     std::erase_if(texts, [](std::string_view text) { return text.find('@') == text.npos; });
-    const AddressChain again = parseAddressLines(lines);
+    const AddressChain again = parseAddressLines(placed(lines));
     require(inputOrder(again, &maillist_addr_entry::addr) == texts, "addresses come back");
 }
 

@@ -25,7 +25,7 @@ void checkAccessList(std::string_view bytes) {
     const std::string text = settledText(field, bytes, accessListSetting);
     AccessList list = field.value_or(AccessList{});
     const AccessList again = parseAccessList(text).value_or(AccessList{});
-    require(again.count() <= list.count(), "an access list gains nothing");
+    require(again.entries.size() <= list.entries.size(), "an access list gains nothing");
     if (text.size() >= 255) { // As far as the text goes.
         list.entries.resize(again.entries.size());
     }

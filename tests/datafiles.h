@@ -1,5 +1,6 @@
 #pragma once
 
+#include "base/kepttext.h"
 #include "base/textfile.h"
 #include "formats.h"
 
@@ -35,14 +36,15 @@ inline std::string operator+(std::string before, const KeptText &text) {
 
 /// The bytes of a file; "none" where it cannot be read.
 inline std::string bytesAt(const std::string &path) {
-    const FileRead file = readWholeFile(path);
-    return file.bytes ? std::string{std::string_view{*file.bytes}} : "none";
+    return readWholeFile(path).bytes.value_or("none");
 }
 
-/// What a format puts of a list.
+/// What a format makes of a list.
 template <class List>
-std::string whole(void (*format)(const List &, ByteSink &), const List &list) {
-    return formatted([&](ByteSink &sink) { format(list, sink); });
+std::string whole(void (*format)(const List &, std::string &), const List &list) {
+    std::string bytes;
+    format(list, bytes);
+    return bytes;
 }
 
 /// A path in the test's own product at which no file is yet.

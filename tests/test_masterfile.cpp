@@ -13,7 +13,9 @@ const std::string masterTemplate = productPaths().masterTemplate;
 const std::string portLine = "%smtp.sock.port: 2525\n";
 
 std::string filled(const std::string &lines) {
-    return whole(formatMasterConfig, masterLines(lines));
+    std::string bytes;
+    formatMasterConfig(lines, bytes);
+    return bytes;
 }
 
 } // namespace

@@ -17,7 +17,7 @@ struct Window : QObject {
         box->resize(200, 300);
         std::vector<KeptText> texts;
         for (const std::string_view row : rows) {
-            texts.push_back(keep(row));
+            texts.push_back(keep(std::string{row}));
         }
         box->append(texts);
         ok->setDefault(true);

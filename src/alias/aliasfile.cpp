@@ -1,5 +1,7 @@
 #include "alias/aliasfile.h"
 
+#include "base/byteset.h"
+#include "base/lines.h"
 #include "base/textfile.h"
 #include "config/settings.h"
 
@@ -35,7 +37,7 @@ alias_list_entry takeTarget(KeptText &rest) {
         target.bang = 1;
         rest.remove_prefix(1);
     }
-    target.alias = rest.substr(0, wordEnds.lengthBefore(rest));
+    target.alias = rest.substr(0, wordEnds.spanBefore(rest));
     rest.remove_prefix(target.alias.size());
     if (target.alias.starts_with('#')) {
         target.type = ALIAS_LIST_ADMIN;
@@ -50,7 +52,7 @@ alias_list_entry takeTarget(KeptText &rest) {
 void takeTargets(KeptText rest, const ByteSet &separators, alias_entry &alias) {
     RecordAppender<alias_list_entry> end{&alias.aliases.head};
     for (;;) {
-        rest.remove_prefix(separators.lengthOf(rest));
+        rest.remove_prefix(separators.span(rest));
         if (rest.empty()) {
             return;
         }
@@ -58,14 +60,16 @@ void takeTargets(KeptText rest, const ByteSet &separators, alias_entry &alias) {
     }
 }
 
-void putAlias(ByteSink &sink, const alias_entry &alias) {
-    sink.put(alias.address);
+void appendAlias(std::string &bytes, const alias_entry &alias) {
+    bytes += alias.address;
     for (const alias_list_entry &target : alias.aliases) {
-        const bool hasAdminMark = target.type == ALIAS_LIST_ADMIN && !target.alias.starts_with('#');
-        sink.put(target.bang == 0 ? (hasAdminMark ? ",#" : ",") : (hasAdminMark ? ",!#" : ",!"));
-        sink.put(target.alias);
+        bytes += target.bang == 0 ? "," : ",!";
+        if (target.type == ALIAS_LIST_ADMIN && !target.alias.starts_with('#')) {
+            bytes += '#';
+        }
+        bytes += target.alias;
     }
-    sink.put('\n');
+    bytes += '\n';
 }
 
 } // namespace
@@ -76,7 +80,7 @@ void parseAliases(KeptText bytes, RecordChain<alias_entry> &list) {
     LinePieces lines{bytes};
     while (const std::optional<KeptText> line = lines.next()) {
         const KeptText text = lineText(*line);
-        const std::size_t addressEnd = wordEnds.lengthBefore(text);
+        const std::size_t addressEnd = wordEnds.spanBefore(text);
         if (!skippedBeginnings.holds(line->front()) && addressEnd < text.size()) {
             alias_entry &alias = end.append({text.substr(0, addressEnd), {}});
             takeTargets(text.substr(addressEnd), separators, alias);
@@ -84,19 +88,19 @@ void parseAliases(KeptText bytes, RecordChain<alias_entry> &list) {
     }
 }
 
-void formatAliases(const RecordChain<alias_entry> &list, ByteSink &sink) {
+void formatAliases(const RecordChain<alias_entry> &list, std::string &bytes) {
     for (const alias_entry &alias : list) {
-        putAlias(sink, alias);
+        appendAlias(bytes, alias);
     }
 }
 
 int readAliasFile() {
-    return aliasFile.read(settings().mail_file_alias.value, [](FileBytes bytes) {
+    return aliasFile.read(settings().mail_file_alias.value, [](std::string bytes) {
         parseAliases(keep(std::move(bytes)), alias_list);
     });
 }
 
 void writeAliasFile() {
     aliasFile.rewrite(settings().mail_file_alias.value,
-                      [](ByteSink &sink) { formatAliases(alias_list, sink); });
+                      [](std::string &bytes) { formatAliases(alias_list, bytes); });
 }

@@ -1,6 +1,5 @@
 #pragma once
 
-#include "base/bytesink.h"
 #include "base/kepttext.h"
 #include "base/recordlist.h"
 
@@ -40,7 +39,7 @@ extern RecordChain<alias_entry> alias_list;
 /// Puts the aliases of the file's bytes at the end of `list`. Throws std::bad_alloc with what was
 /// read until then in the list.
 void parseAliases(KeptText bytes, RecordChain<alias_entry> &list);
-void formatAliases(const RecordChain<alias_entry> &list, ByteSink &sink);
+void formatAliases(const RecordChain<alias_entry> &list, std::string &bytes);
 
 /// Adds the file's aliases to alias_list. 0 when the file was read to its end, 1 when it cannot be
 /// opened, 2 when memory ran out; what was read until then stays.

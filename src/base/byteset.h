@@ -26,15 +26,13 @@ public:
 
     [[nodiscard]] bool holds(char byte) const { return holds_[static_cast<unsigned char>(byte)]; }
 
-    /// How many bytes at the beginning of the text are no members.
-    [[nodiscard]] std::size_t lengthBefore(std::string_view text) const {
-        return length(text, false);
-    }
     /// How many bytes at the beginning of the text are members.
-    [[nodiscard]] std::size_t lengthOf(std::string_view text) const { return length(text, true); }
+    [[nodiscard]] std::size_t span(std::string_view text) const { return span(text, true); }
+    /// How many bytes at the beginning of the text are no members.
+    [[nodiscard]] std::size_t spanBefore(std::string_view text) const { return span(text, false); }
 
 private:
-    [[nodiscard]] std::size_t length(std::string_view text, bool areMembers) const {
+    [[nodiscard]] std::size_t span(std::string_view text, bool areMembers) const {
         std::size_t end = 0;
         while (end < text.size() && holds(text[end]) == areMembers) {
             ++end;

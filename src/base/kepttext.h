@@ -1,25 +1,15 @@
 #pragma once
 
 #include <cstddef>
-#include <memory>
+#include <string>
 #include <string_view>
-
-/// The bytes of a file.
-struct FileBytes {
-    std::unique_ptr<char[]> bytes;
-    std::size_t length = 0;
-
-    // NOLINTNEXTLINE(google-explicit-constructor): to be read like any other text.
-    operator std::string_view() const & { return {bytes.get(), length}; }
-    operator std::string_view() const && = delete; ///< It would see bytes that are gone.
-};
 
 /// A text whose bytes stay where they are until the process ends, so that records, their copies and
 /// whatever shows them hold views of one text instead of texts of their own. Only `keep` makes one
 /// that is not empty, and parts of one are such again: it cannot dangle.
 ///
-/// The price: the bytes of a text that is replaced or removed stay, too, and so do those of a data
-/// file that no record took. They are few beside what is in use: a user typed them, or they are
+/// The price: the bytes of a text that is replaced or removed stay, too, and so does all of a file
+/// that records hold parts of. They are few beside what is in use: a user typed them, or they are
 /// comments and keys.
 class KeptText {
 public:
@@ -45,14 +35,10 @@ public:
 
 private:
     explicit constexpr KeptText(std::string_view bytes) : bytes_{bytes} {}
-    friend KeptText keep(std::string_view text);
-    friend KeptText keep(FileBytes file);
+    friend KeptText keep(std::string text);
 
     std::string_view bytes_;
 };
 
-/// Copies the text to where it stays. Throws std::bad_alloc.
-KeptText keep(std::string_view text);
-
-/// Takes over the file's bytes. Throws std::bad_alloc.
-KeptText keep(FileBytes file);
+/// Takes the text, one that was typed or a whole file, to where it stays. Throws std::bad_alloc.
+KeptText keep(std::string text);

@@ -1,13 +1,14 @@
 #include "base/textfile.h"
 
-#include "base/bulkmemory.h"
-
+#include <array>
 #include <cerrno>
 #include <fcntl.h>
+#include <new>
 #include <sys/resource.h>
 #include <sys/stat.h>
 #include <sys/statvfs.h>
 #include <unistd.h>
+#include <utility>
 
 namespace {
 
@@ -29,8 +30,8 @@ public:
 private:
     static int opened(const char *path, int flags, mode_t newFileMode) {
         // A pipe must not make the program wait for its other end. A regular file that someone
-        // holds a lease on would fail here as well; it is worth the wait until the lease is given
-        // up.
+        // holds a lease on, such as a file server, would fail here as well; it is worth the wait
+        // until the lease is given up.
         const int number = ::open(path, flags | O_NONBLOCK, newFileMode);
         struct stat status = {};
         if (number < 0 && errno == EWOULDBLOCK && ::stat(path, &status) == 0 &&
@@ -43,76 +44,49 @@ private:
     int number_;
 };
 
-/// Counts the bytes, and writes them once there is a file for them.
-class FileSink : public ByteSink {
-public:
-    /// How many bytes there were since the beginning, or since there is a file.
-    [[nodiscard]] std::size_t count() const { return count_; }
-    void writeTo(int file) {
-        file_ = file;
-        count_ = 0;
-    }
-    [[nodiscard]] bool isWhole() const { return isWhole_; }
-
-protected:
-    void take(std::string_view bytes) override {
-        count_ += bytes.size();
-        while (file_ >= 0 && isWhole_ && !bytes.empty()) {
-            const ssize_t count = ::write(file_, bytes.data(), bytes.size());
-            if (count > 0) {
-                bytes.remove_prefix(static_cast<std::size_t>(count));
-            } else {
-                isWhole_ = count < 0 && errno == EINTR;
-            }
-        }
-    }
-
-private:
-    int file_ = -1;
-    std::size_t count_ = 0;
-    bool isWhole_ = true;
-};
-
-/// Whether the file system says that it has room for `size` bytes more; some say nothing.
-bool hasFreeSpace(int file, std::size_t size) {
+/// Whether the file system says that it has `size` bytes left; some say nothing.
+bool hasSpaceLeft(int file, std::size_t size) {
     struct statvfs system = {};
     return ::fstatvfs(file, &system) != 0 || system.f_blocks == 0 ||
            system.f_bavail * system.f_frsize >= size;
 }
 
-/// Gives back what room the file has behind its end.
-void giveRoomBack(int file) {
+/// Gives back the space that the file has behind its end.
+void releaseSpace(int file) {
     struct stat status = {};
     if (::fstat(file, &status) == 0) {
         [[maybe_unused]] const int result = ::ftruncate(file, status.st_size);
     }
 }
 
-/// Has room for `size` bytes set aside for the file; where the file system cannot do that, asks
-/// whether there is as much. False when there is none.
-bool takeRoom(int file, const struct stat &status, std::size_t size) {
+/// Sets space for `size` bytes aside for the file; where the file system cannot do that, asks
+/// whether there is as much beside what the file has. False when there is not.
+bool setSpaceAside(int file, off_t oldSize, std::size_t size) {
     rlimit limit{};
     if (::getrlimit(RLIMIT_FSIZE, &limit) == 0 && limit.rlim_cur < size) {
         return false;
     }
-    if (size == 0) {
-        return true;
-    }
-    int result = 0;
-    do {
-        result = ::fallocate(file, FALLOC_FL_KEEP_SIZE, 0, static_cast<off_t>(size));
-    } while (result != 0 && errno == EINTR);
-    if (result == 0) {
+    if (size == 0 || ::fallocate(file, FALLOC_FL_KEEP_SIZE, 0, static_cast<off_t>(size)) == 0) {
         return true;
     }
     if (errno != ENOSPC && errno != EDQUOT && errno != EFBIG) {
-        // What a file with holes has may lie behind them.
-        const off_t had = status.st_blocks * 512;
-        const auto usable = static_cast<std::size_t>(had < status.st_size ? 0 : had);
-        return size <= usable || hasFreeSpace(file, size - usable);
+        const auto had = static_cast<std::size_t>(oldSize);
+        return size <= had || hasSpaceLeft(file, size - had);
     }
-    giveRoomBack(file); // A call that fails keeps what it got by then.
+    releaseSpace(file); // A call that fails keeps what it got by then.
     return false;
+}
+
+bool writeAll(int file, std::string_view bytes) {
+    while (!bytes.empty()) {
+        const ssize_t count = ::write(file, bytes.data(), bytes.size());
+        if (count > 0) {
+            bytes.remove_prefix(static_cast<std::size_t>(count));
+        } else if (count == 0 || errno != EINTR) {
+            return false;
+        }
+    }
+    return true;
 }
 
 } // namespace
@@ -126,72 +100,42 @@ FileRead readWholeFile(const std::string &path) {
     if (::fstat(file.number(), &status) != 0 || !S_ISREG(status.st_mode)) {
         return {};
     }
-    // One byte more than the size, so that the end is found without growing; a file that says
-    // nothing of its size, or grows meanwhile, is read to its end all the same.
-    std::size_t size = static_cast<std::size_t>(status.st_size) + 1;
-    FileBytes read{std::unique_ptr<char[]>{newBulk<char>(size)}};
+    // A file that says nothing of its size, or grows meanwhile, is read to its end all the same.
+    std::string bytes;
+    bytes.reserve(static_cast<std::size_t>(status.st_size));
+    std::array<char, 65'536> piece{};
     for (;;) {
-        const ssize_t count =
-            ::read(file.number(), read.bytes.get() + read.length, size - read.length);
-        if (count < 0 && errno == EINTR) {
-            continue;
-        }
-        if (count < 0) {
-            return {};
-        }
+        const ssize_t count = ::read(file.number(), piece.data(), piece.size());
         if (count == 0) {
-            return {std::move(read)};
+            return {std::move(bytes)};
         }
-        read.length += static_cast<std::size_t>(count);
-        if (read.length == size) {
-            size = 2 * size + 4096;
-            std::unique_ptr<char[]> larger{newBulk<char>(size)};
-            std::memcpy(larger.get(), read.bytes.get(), read.length);
-            read.bytes = std::move(larger);
+        if (count > 0) {
+            bytes.append(piece.data(), static_cast<std::size_t>(count));
+        } else if (errno != EINTR) {
+            return {};
         }
     }
 }
 
-bool rewriteFile(const std::string &path, const std::function<void(ByteSink &)> &format,
-                 mode_t newFileMode) {
-    FileSink sink;
-    format(sink);
-    sink.flush();
+bool rewriteFile(const std::string &path, std::string_view bytes, mode_t newFileMode) {
     const FileDescriptor file{path, O_WRONLY | O_CREAT, newFileMode};
     struct stat status = {};
     if (!file.isOpen() || ::fstat(file.number(), &status) != 0) {
         return false;
     }
     const bool isRegular = S_ISREG(status.st_mode);
-    if (isRegular && !takeRoom(file.number(), status, sink.count())) {
+    if (isRegular && !setSpaceAside(file.number(), status.st_size, bytes.size())) {
         return false;
     }
-    sink.writeTo(file.number());
-    format(sink);
-    sink.flush();
-    if (!sink.isWhole()) {
-        giveRoomBack(file.number());
+    if (!writeAll(file.number(), bytes)) {
+        releaseSpace(file.number());
         return false;
     }
-    // Only now, and only behind what was written: to cut it first would give the room away again.
+    // Only now, and only behind what was written: to cut it first would give the space away again.
     const bool isCut =
-        !isRegular || ::ftruncate(file.number(), static_cast<off_t>(sink.count())) == 0;
+        !isRegular || ::ftruncate(file.number(), static_cast<off_t>(bytes.size())) == 0;
     // Before the next file is touched. What is no file, or on no disk, cannot, and need not.
     return (::fdatasync(file.number()) == 0 || errno == EINVAL || errno == EROFS) && isCut;
-}
-
-bool rewriteFile(const std::string &path, std::string_view bytes) {
-    return rewriteFile(path, [bytes](ByteSink &sink) { sink.put(bytes); });
-}
-
-void ProductFile::rewrite(const Path &path, const std::function<void(ByteSink &)> &format,
-                          mode_t newFileMode) const {
-    try {
-        if (path && isWhole_) {
-            rewriteFile(*path, format, newFileMode);
-        }
-    } catch (const std::bad_alloc &) { // Like every failed write: nothing is reported.
-    }
 }
 
 bool mayRewrite(const std::string &path) {
@@ -204,4 +148,32 @@ bool mayRewrite(const std::string &path) {
     const std::size_t folderEnd = path.rfind('/');
     return errno == ENOENT && folderEnd != std::string::npos &&
            isAllowed(path.substr(0, folderEnd + 1), W_OK | X_OK);
+}
+
+int ProductFile::read(const Path &path, const std::function<void(std::string bytes)> &take) {
+    isWhole_ = false;
+    try {
+        FileRead file = path ? readWholeFile(*path) : FileRead{std::nullopt, true};
+        if (file.bytes) {
+            sizeRead_ = file.bytes->size();
+            take(*std::move(file.bytes));
+        }
+        isWhole_ = file.bytes || file.isMissing;
+        return file.bytes ? 0 : 1;
+    } catch (const std::bad_alloc &) {
+        return 2;
+    }
+}
+
+void ProductFile::rewrite(const Path &path, const std::function<void(std::string &bytes)> &format,
+                          mode_t newFileMode) const {
+    try {
+        if (path && isWhole_) {
+            std::string bytes;
+            bytes.reserve(sizeRead_ + sizeRead_ / 8); // Edits seldom lengthen it by more.
+            format(bytes);
+            rewriteFile(*path, bytes, newFileMode);
+        }
+    } catch (const std::bad_alloc &) { // Like every failed write: nothing is reported.
+    }
 }

@@ -5,7 +5,6 @@
 #include <algorithm>
 #include <arpa/inet.h>
 #include <array>
-#include <utility>
 
 namespace {
 
@@ -24,8 +23,8 @@ constexpr std::array<PrefixMask, 5> prefixMasks{{{'0', "/0", 0},
                                                  {'2', "/24", 0xffffff00},
                                                  {'3', "/32", 0xffffffff}}};
 
-constexpr AccessListEntry allHosts{0, 0};
-constexpr AccessListEntry noHosts{0, 0xffffffff};
+constexpr AccessListEntry allHosts{.address = 0, .mask = 0};
+constexpr AccessListEntry noHosts{.address = 0, .mask = 0xffffffff};
 constexpr std::uint32_t singleHost = 0xffffffff;
 
 std::optional<std::uint32_t> addressOf(std::string_view word) {
@@ -75,7 +74,7 @@ std::optional<AccessListEntry> parseItem(std::string_view item) {
     if (!address) {
         return std::nullopt;
     }
-    return AccessListEntry{*address, maskAfter(item.substr(word.size()))};
+    return AccessListEntry{.address = *address, .mask = maskAfter(item.substr(word.size()))};
 }
 
 std::string formatEntry(const AccessListEntry &entry) {

@@ -23,7 +23,6 @@ struct AccessListEntry {
 struct AccessList {
     std::vector<AccessListEntry> entries;
 
-    [[nodiscard]] std::int32_t count() const { return static_cast<std::int32_t>(entries.size()); }
     bool operator==(const AccessList &) const = default;
 };
 

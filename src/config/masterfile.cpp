@@ -1,5 +1,7 @@
 #include "config/masterfile.h"
 
+#include "base/byteset.h"
+#include "base/lines.h"
 #include "base/textfile.h"
 #include "config/productpaths.h"
 #include "config/settings.h"
@@ -18,10 +20,6 @@ constexpr char commentMark = '|';
 constexpr char keyMark = '%';
 constexpr ByteSet blanks{" \t"};
 
-std::string_view withoutLeadingBlanks(std::string_view text) {
-    return text.substr(blanks.lengthOf(text));
-}
-
 /// Collects one setting's lines; hands them over when the next setting begins.
 class ValueReader {
 public:
@@ -32,7 +30,7 @@ public:
     }
 
     void add(std::string_view text) {
-        text = withoutLeadingBlanks(text);
+        text.remove_prefix(blanks.span(text));
         if (!text.empty() && !value_.empty()) {
             value_ += ',';
         }
@@ -50,26 +48,28 @@ private:
     std::string value_;
 };
 
-/// A template's key line with the store's value, or as it is.
-MasterLine keyLine(std::string_view line) {
-    const std::size_t colon = beforeNul(line).find(':');
-    if (colon != std::string_view::npos) {
-        if (auto value = settingByKey(std::string{line.substr(1, colon - 1)}, std::nullopt)) {
-            return {line.substr(0, colon), std::move(value)};
-        }
-    }
-    return {line, std::nullopt};
-}
-
-void putValue(ByteSink &sink, std::string_view value) {
-    sink.put(": ");
+void appendValue(std::string &bytes, std::string_view value) {
+    bytes += ": ";
     for (std::size_t comma = 0; (comma = value.find(',')) != std::string_view::npos;) {
-        sink.put(value.substr(0, comma));
-        sink.put("\n\t");
+        bytes += value.substr(0, comma);
+        bytes += "\n\t";
         value.remove_prefix(comma + 1);
     }
-    sink.put(value);
-    sink.put('\n');
+    bytes += value;
+    bytes += '\n';
+}
+
+/// Appends a template's key line with the store's value, or as it is.
+void appendKeyLine(std::string &bytes, std::string_view line) {
+    const std::size_t colon = beforeNul(line).find(':');
+    if (colon != std::string_view::npos) {
+        if (const auto value = settingByKey(std::string{line.substr(1, colon - 1)}, std::nullopt)) {
+            bytes += line.substr(0, colon);
+            appendValue(bytes, *value);
+            return;
+        }
+    }
+    bytes += line;
 }
 
 } // namespace
@@ -93,24 +93,13 @@ void parseMasterConfig(std::string_view bytes) {
     setting.end();
 }
 
-std::vector<MasterLine> masterLines(std::string_view masterTemplate) {
-    std::vector<MasterLine> filled;
+void formatMasterConfig(std::string_view masterTemplate, std::string &bytes) {
     LinePieces lines{masterTemplate};
     while (const std::optional<std::string_view> line = lines.next()) {
         if (line->front() == commentMark) {
-            filled.push_back({*line, std::nullopt});
+            bytes += *line;
         } else if (line->front() == keyMark) {
-            filled.push_back(keyLine(*line));
-        }
-    }
-    return filled;
-}
-
-void formatMasterConfig(const std::vector<MasterLine> &lines, ByteSink &sink) {
-    for (const MasterLine &line : lines) {
-        sink.put(line.text);
-        if (line.value) {
-            putValue(sink, *line.value);
+            appendKeyLine(bytes, *line);
         }
     }
 }
@@ -118,7 +107,7 @@ void formatMasterConfig(const std::vector<MasterLine> &lines, ByteSink &sink) {
 int readMasterConfig() {
     const char *path = productPaths().master;
     const int result =
-        masterFile.read(path, [](const FileBytes &bytes) { parseMasterConfig(bytes); });
+        masterFile.read(path, [](const std::string &bytes) { parseMasterConfig(bytes); });
     if (result == 1) {
         std::printf("Couldn't open config file:%s\n", path);
         std::fflush(stdout);
@@ -129,11 +118,10 @@ int readMasterConfig() {
 void writeMasterConfig() {
     try {
         const FileRead masterTemplate = readWholeFile(productPaths().masterTemplate);
-        if (masterTemplate.bytes) {
-            const std::vector<MasterLine> lines = masterLines(*masterTemplate.bytes);
+        if (const std::optional<std::string> &lines = masterTemplate.bytes) {
             masterFile.rewrite(
                 productPaths().master,
-                [&lines](ByteSink &sink) { formatMasterConfig(lines, sink); }, newFileMode);
+                [&lines](std::string &bytes) { formatMasterConfig(*lines, bytes); }, newFileMode);
         }
     } catch (const std::bad_alloc &) { // Like every failed write: nothing is reported.
     }

@@ -1,11 +1,7 @@
 #pragma once
 
-#include "base/bytesink.h"
-
-#include <optional>
 #include <string>
 #include <string_view>
-#include <vector>
 
 /// The master file and its template share one line format. The first character decides:
 ///
@@ -20,17 +16,9 @@
 /// Hands each key and value to the store, in the order of the file.
 void parseMasterConfig(std::string_view bytes);
 
-/// A line of the master file to be: one of the template's as it is, or a key line up to its colon
-/// and the store's value.
-struct MasterLine {
-    std::string_view text; ///< Of the template.
-    std::optional<std::string> value;
-};
-
-/// The master file for the store's values. A key line that the store has no text for is kept as the
-/// template has it, and so is one without a colon.
-std::vector<MasterLine> masterLines(std::string_view masterTemplate);
-void formatMasterConfig(const std::vector<MasterLine> &lines, ByteSink &sink);
+/// Appends the master file for the store's values. A key line that the store has no text for is
+/// kept as the template has it, and so is one without a colon.
+void formatMasterConfig(std::string_view masterTemplate, std::string &bytes);
 
 /// Fills the store. 0; 1 after a line on standard output when the file cannot be opened; 2 when
 /// memory ran out.

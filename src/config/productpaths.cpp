@@ -2,6 +2,7 @@
 
 ProductPaths productPaths() {
     // The quotes are for a prefix with blanks; the build refuses one that holds a quote.
-    return {TARVEX_PREFIX "/config/master", TARVEX_PREFIX "/config/templates/master",
-            "'" TARVEX_PREFIX "/bin/tvxreconf'"};
+    return {.master = TARVEX_PREFIX "/config/master",
+            .masterTemplate = TARVEX_PREFIX "/config/templates/master",
+            .reconfigureCommand = "'" TARVEX_PREFIX "/bin/tvxreconf'"};
 }

@@ -3,8 +3,6 @@
 #include "config/settingvalues.h"
 
 #include <string>
-#include <string_view>
-#include <unordered_map>
 #include <vector>
 
 /// One key of the master file with its value.
@@ -42,7 +40,6 @@ public:
 private:
     friend class Setting;
     std::vector<Setting *> all_;
-    std::unordered_map<std::size_t, std::vector<Setting *>> byShape_;
 };
 
 /// What one unit in the file stands for in the store.

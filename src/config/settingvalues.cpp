@@ -1,7 +1,5 @@
 #include "config/settingvalues.h"
 
-#include "base/bulkmemory.h"
-
 #include <algorithm>
 #include <array>
 #include <cctype>
@@ -52,7 +50,7 @@ std::int32_t parseTime(std::string_view text) {
 
 std::string paddedToTwo(std::int32_t number) {
     std::string text{number < 10 ? " " : ""};
-    text += formatSigned(number);
+    text += std::to_string(number);
     return text;
 }
 
@@ -63,7 +61,6 @@ std::optional<std::string> textSetting(std::optional<std::string> &field, TextOr
         return field;
     }
     try {
-        leaveMemoryForToolkit(text->size());
         field = std::string{*text};
     } catch (const std::bad_alloc &) {
         field.reset();
@@ -75,7 +72,7 @@ std::optional<std::string> textSetting(std::optional<std::string> &field, TextOr
 std::optional<std::string> numberSetting(std::int32_t &field, TextOrNone text, int scale) {
     scale = std::max(scale, 1);
     if (!text) {
-        return formatSigned(field / scale);
+        return std::to_string(field / scale);
     }
     field = wrapped(std::int64_t{parseInteger(*text)} * scale);
     return std::nullopt;
@@ -129,11 +126,4 @@ std::string formatUnsigned(std::uint32_t value) { return std::to_string(value); 
 std::int32_t parseInteger(std::string_view text) {
     // atoi itself may do anything with a number that is too large; this is what it does here.
     return wrapped(std::strtoll(std::string{text}.c_str(), nullptr, 10));
-}
-
-std::string formatSigned(std::int32_t value) {
-    const auto magnitude = static_cast<std::uint32_t>(std::abs(std::int64_t{value}));
-    std::string text{value < 0 ? "-" : ""};
-    text += formatUnsigned(magnitude);
-    return text;
 }

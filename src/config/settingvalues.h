@@ -36,9 +36,6 @@ int compareNoCase(const char *a, const char *b);
 /// Decimal digits alone.
 std::string formatUnsigned(std::uint32_t value);
 
-/// The integer that begins the text, by the rules of the C library's atoi; a number that has no
-/// room in 32 bits wraps.
+/// The integer that begins the text, by the rules of the C library's atoi; a number that does
+/// not fit into 32 bits wraps.
 std::int32_t parseInteger(std::string_view text);
-
-/// The number with a minus sign where it is negative.
-std::string formatSigned(std::int32_t value);

@@ -24,8 +24,8 @@ std::uint32_t takeFlags(std::string_view &text) {
 
 template <std::size_t size>
 void takeField(std::string_view &text, std::array<char, size> &field) {
-    const std::string_view room = text.substr(0, size - 1);
-    const std::string_view taken = room.substr(0, separators.lengthBefore(room));
+    const std::string_view longest = text.substr(0, size - 1);
+    const std::string_view taken = longest.substr(0, separators.spanBefore(longest));
     setPopHostText(field, taken);
     text.remove_prefix(taken.size());
 }
@@ -61,7 +61,7 @@ void parsePopHosts(TextOrNone text) {
     RecordAppender<pop_host> end{&pop_host_list.head};
     try {
         for (;;) {
-            rest.remove_prefix(betweenEntries.lengthOf(rest));
+            rest.remove_prefix(betweenEntries.span(rest));
             if (rest.empty()) {
                 return;
             }

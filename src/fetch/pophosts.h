@@ -13,7 +13,7 @@
 ///
 ///     *ann:secret@pop.example.com,-*bob:hidden@mail.example.net
 ///
-/// A field ends at the next ":", "@", comma or line break, or when its room is full.
+/// A field ends at the next ":", "@", comma or line break, or when its array is full.
 
 constexpr std::uint32_t POP_HOST_MINUS = 2;
 constexpr std::uint32_t POP_HOST_STAR = 4;
@@ -35,7 +35,7 @@ std::string_view popHostText(const std::array<char, size> &field) {
     return field.data();
 }
 
-/// Puts as much of the text as has room into one of the record's arrays.
+/// Puts as much of the text as fits into one of the record's arrays.
 template <std::size_t size>
 void setPopHostText(std::array<char, size> &field, std::string_view text) {
     field.fill('\0');

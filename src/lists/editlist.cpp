@@ -180,7 +180,7 @@ QGroupBox *EditList::newTexts(const maillist_entry &list) {
 TextField *EditList::addText(QHBoxLayout *row, TranslatableText caption, CaptionColumn &captions,
                              KeptText maillist_fields::*field, const maillist_entry &list) {
     TextField *edit = addField(row, caption, captions, list.*field);
-    edit->setRule(lengthRule(mostBytesOf(field)));
+    edit->setRule(lengthRule(maximumBytesOf(field)));
     stores_.emplace_back(
         [edit, field](maillist_fields &fields) { fields.*field = edit->keptText(fields.*field); });
     return edit;

@@ -71,12 +71,12 @@ void EditList::Load(QListBox *box, maillist_addr_entry **chain) {
     if (dialog.exec() != QDialog::Accepted) {
         return;
     }
-    const FileRead file = readWholeFile(dialog.fileName());
+    FileRead file = readWholeFile(dialog.fileName());
     if (!file.bytes) {
         showUnreadable(this);
         return;
     }
-    AddressChain loaded = parseAddressLines(*file.bytes);
+    AddressChain loaded = parseAddressLines(keep(*std::move(file.bytes)));
     std::vector<KeptText> rows;
     for (const maillist_addr_entry &address : loaded) {
         rows.push_back(address.addr);

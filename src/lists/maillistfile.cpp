@@ -1,5 +1,6 @@
 #include "lists/maillistfile.h"
 
+#include "base/lines.h"
 #include "base/textfile.h"
 #include "config/settings.h"
 #include "config/settingvalues.h"
@@ -122,35 +123,35 @@ private:
     AddressChain *section_ = nullptr;
 };
 
-void putLine(ByteSink &sink, std::string_view key, std::string_view value = {}) {
-    sink.put(key);
-    sink.put(value);
-    sink.put('\n');
+void appendLine(std::string &bytes, std::string_view key, std::string_view value = {}) {
+    bytes += key;
+    bytes += value;
+    bytes += '\n';
 }
 
-void putSection(ByteSink &sink, std::string_view name, const AddressChain &addresses) {
-    putLine(sink, "#start ", name);
+void appendSection(std::string &bytes, std::string_view name, const AddressChain &addresses) {
+    appendLine(bytes, "#start ", name);
     for (const maillist_addr_entry &address : addresses) {
         if (!address.addr.starts_with('#') && address.addr.size() <= longestPiece) {
-            putLine(sink, address.addr);
+            appendLine(bytes, address.addr);
         }
     }
-    putLine(sink, "#end");
+    appendLine(bytes, "#end");
 }
 
-void putList(ByteSink &sink, const maillist_entry &list) {
-    putLine(sink, "#new");
+void appendList(std::string &bytes, const maillist_entry &list) {
+    appendLine(bytes, "#new");
     for (const auto &[key, field] : textKeys) {
-        putLine(sink, key, list.*field);
+        appendLine(bytes, key, list.*field);
     }
     for (const auto &[key, field] : numberKeys) {
-        putLine(sink, key, formatSigned(list.*field));
+        appendLine(bytes, key, std::to_string(list.*field));
     }
-    putLine(sink, flagsKey, formatUnsigned(list.flags));
+    appendLine(bytes, flagsKey, formatUnsigned(list.flags));
     for (const auto &[name, chain] : sections) {
-        putSection(sink, name, list.*chain);
+        appendSection(bytes, name, list.*chain);
     }
-    sink.put("#endlist\n\n\n");
+    bytes += "#endlist\n\n\n";
 }
 
 } // namespace
@@ -163,36 +164,36 @@ void parseMailLists(KeptText bytes, RecordChain<maillist_entry> &lists) {
     }
 }
 
-void formatMailLists(const RecordChain<maillist_entry> &lists, ByteSink &sink) {
+void formatMailLists(const RecordChain<maillist_entry> &lists, std::string &bytes) {
     for (const maillist_entry &list : lists) {
-        putList(sink, list);
+        appendList(bytes, list);
     }
 }
 
-AddressChain parseAddressLines(std::string_view bytes) {
+AddressChain parseAddressLines(KeptText bytes) {
     AddressChain addresses;
     LinePieces pieces{bytes, longestLoadedPiece};
-    while (const std::optional<std::string_view> piece = pieces.next()) {
-        if (beforeNul(*piece).find('@') != std::string_view::npos) {
-            prependRecord(&addresses.head, {keep(lineText(*piece))});
+    while (const std::optional<KeptText> piece = pieces.next()) {
+        if (std::string_view{beforeNul(*piece)}.find('@') != std::string_view::npos) {
+            prependRecord(&addresses.head, {lineText(*piece)});
         }
     }
     return addresses;
 }
 
-std::size_t mostBytesOf(KeptText maillist_entry::*field) {
+std::size_t maximumBytesOf(KeptText maillist_entry::*field) {
     const auto found = std::ranges::find(textKeys, field, &TextKey::field);
     return longestTyped - found->key.size();
 }
 
 void readMailListFile() {
     maillist_list.clear();
-    mailListFile.read(settings().mail_file_maillist.value, [](FileBytes bytes) {
+    mailListFile.read(settings().mail_file_maillist.value, [](std::string bytes) {
         parseMailLists(keep(std::move(bytes)), maillist_list);
     });
 }
 
 void writeMailListFile() {
     mailListFile.rewrite(settings().mail_file_maillist.value,
-                         [](ByteSink &sink) { formatMailLists(maillist_list, sink); });
+                         [](std::string &bytes) { formatMailLists(maillist_list, bytes); });
 }

@@ -1,11 +1,10 @@
 #pragma once
 
-#include "base/bytesink.h"
 #include "base/kepttext.h"
 #include "base/recordlist.h"
 
+#include <cstddef>
 #include <cstdint>
-#include <string_view>
 
 /// The mailing-list file: one block a list, keys in the first column, values without a blank before
 /// them, then the three address lists:
@@ -59,8 +58,7 @@ struct maillist_fields {
     KeptText info;           ///< Path of a file.
     std::int32_t diglen = 0; ///< kB
     std::int32_t digno = 0;  ///< Messages.
-    std::int32_t digcnt =
-        0; ///< This and the next belong to the mail service: only carried through.
+    std::int32_t digcnt = 0; ///< This and the next are the mail service's: only carried through.
     std::int32_t digcur = 0;
     std::uint32_t flags = 0; ///< MAILLIST_... bits; others are carried through.
 };
@@ -81,18 +79,19 @@ void parseMailLists(KeptText bytes, RecordChain<maillist_entry> &lists);
 /// Addresses that begin with "#" are left out: such a line would end its section and take the
 /// addresses behind it along. So would the rest of one of more than 249 bytes, which the file's
 /// reader takes for a line of its own.
-void formatMailLists(const RecordChain<maillist_entry> &lists, ByteSink &sink);
+void formatMailLists(const RecordChain<maillist_entry> &lists, std::string &bytes);
 
 /// The addresses of a plain text file: every line that holds "@", whole. A line is taken in pieces
-/// of at most 254 bytes, and each address is put at the head. They alone are kept. Throws
+/// of at most 254 bytes, and each address is put at the head. They are parts of the file, which so
+/// costs its size for the process's life even where the editor is cancelled then. Throws
 /// std::bad_alloc.
-AddressChain parseAddressLines(std::string_view bytes);
+AddressChain parseAddressLines(KeptText bytes);
 
-/// The most bytes to be typed of a line: with its line feed it is read in one piece.
+/// The maximum of bytes to be typed of a line: with its line feed it is read in one piece.
 constexpr std::size_t longestTyped = 248;
 
 /// How many of them are left for this text of a list.
-std::size_t mostBytesOf(KeptText maillist_entry::*field);
+std::size_t maximumBytesOf(KeptText maillist_entry::*field);
 
 /// Fills maillist_list anew from the file; empty when it cannot be read.
 void readMailListFile();

@@ -1,5 +1,7 @@
 #include "server/smtprejectfile.h"
 
+#include "base/byteset.h"
+#include "base/lines.h"
 #include "base/textfile.h"
 #include "config/settings.h"
 
@@ -27,26 +29,26 @@ void parseSmtpRejects(KeptText bytes, RecordChain<smtpreject_entry> &list) {
     LinePieces pieces{bytes, longestPiece};
     while (const std::optional<KeptText> piece = pieces.next()) {
         if (beginnings.holds(piece->front())) {
-            prependRecord(&list.head, {piece->substr(0, wordEnds.lengthBefore(*piece))});
+            prependRecord(&list.head, {piece->substr(0, wordEnds.spanBefore(*piece))});
         }
     }
 }
 
-void formatSmtpRejects(const RecordChain<smtpreject_entry> &list, ByteSink &sink) {
+void formatSmtpRejects(const RecordChain<smtpreject_entry> &list, std::string &bytes) {
     for (const smtpreject_entry &entry : list) {
-        sink.put(entry.domain);
-        sink.put('\n');
+        bytes += entry.domain;
+        bytes += '\n';
     }
 }
 
 void readSmtpRejectFile() {
     smtpreject_list.clear();
-    rejectFile.read(settings().mail_file_smtpreject.value, [](FileBytes bytes) {
+    rejectFile.read(settings().mail_file_smtpreject.value, [](std::string bytes) {
         parseSmtpRejects(keep(std::move(bytes)), smtpreject_list);
     });
 }
 
 void writeSmtpRejectFile() {
     rejectFile.rewrite(settings().mail_file_smtpreject.value,
-                       [](ByteSink &sink) { formatSmtpRejects(smtpreject_list, sink); });
+                       [](std::string &bytes) { formatSmtpRejects(smtpreject_list, bytes); });
 }

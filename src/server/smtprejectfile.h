@@ -1,6 +1,5 @@
 #pragma once
 
-#include "base/bytesink.h"
 #include "base/kepttext.h"
 #include "base/recordlist.h"
 
@@ -22,7 +21,7 @@ extern RecordChain<smtpreject_entry> smtpreject_list;
 /// Puts the entries of the file's bytes at the head of `list`. Throws std::bad_alloc with what was
 /// read until then in the list.
 void parseSmtpRejects(KeptText bytes, RecordChain<smtpreject_entry> &list);
-void formatSmtpRejects(const RecordChain<smtpreject_entry> &list, ByteSink &sink);
+void formatSmtpRejects(const RecordChain<smtpreject_entry> &list, std::string &bytes);
 
 /// Fills smtpreject_list anew from the file; empty when it cannot be read.
 void readSmtpRejectFile();

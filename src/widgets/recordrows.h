@@ -82,7 +82,7 @@ public:
 
 private:
     static KeptText keptRow(KeptText text) { return text; }
-    static KeptText keptRow(std::string_view text) { return keep(text); }
+    static KeptText keptRow(std::string_view text) { return keep(std::string{text}); }
     KeptText rowOf(const Record &record) const { return keptRow(textOf_(record)); }
 
     Record **linkToShown(std::string_view text) const {

@@ -102,7 +102,7 @@ QString left(const std::string &bytes, const QStringList &rules) {
 /// by rules alone: `dropped` is what is not read, `alike` what is written in one way of several.
 template <class Record>
 void checkFile(const char *path, void (*parse)(KeptText, RecordChain<Record> &),
-               void (*format)(const RecordChain<Record> &, ByteSink &),
+               void (*format)(const RecordChain<Record> &, std::string &),
                const RecordChain<Record> &list, int reads, const QStringList &dropped,
                const QStringList &alike) {
     const std::string file = bytesAt(path);

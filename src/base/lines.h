@@ -1,0 +1,58 @@
+#pragma once
+
+#include <cstddef>
+#include <cstring>
+#include <optional>
+#include <string_view>
+
+/// How a file's bytes fall into lines. `Text` is a string_view or a KeptText: what is cut off one
+/// is another of its kind.
+
+/// Cuts bytes into the pieces that the C library's line reading gives: up to and including a line
+/// feed, but at most `longest` bytes, the line feed counted among them. So a line of exactly
+/// `longest` bytes leaves its line feed to the next piece.
+template <class Text>
+class LinePieces {
+public:
+    static constexpr std::size_t unlimited = std::string_view::npos;
+
+    explicit LinePieces(Text bytes, std::size_t longest = unlimited)
+        : rest_{bytes}, longest_{longest} {}
+
+    /// The next piece, never empty; none at the end of the bytes.
+    std::optional<Text> next() {
+        if (rest_.empty()) {
+            return std::nullopt;
+        }
+        // The search stays within the piece: short pieces of one endless line are cut in linear
+        // time.
+        const std::size_t reach = rest_.size() < longest_ ? rest_.size() : longest_;
+        const void *lineFeed = std::memchr(rest_.data(), '\n', reach);
+        const std::size_t length =
+            lineFeed == nullptr
+                ? reach
+                : static_cast<std::size_t>(static_cast<const char *>(lineFeed) - rest_.data()) + 1;
+        const Text piece = rest_.substr(0, length);
+        rest_.remove_prefix(length);
+        return piece;
+    }
+
+private:
+    Text rest_;
+    std::size_t longest_;
+};
+
+/// What a C string made of the piece would hold: everything before its first NUL.
+template <class Text>
+Text beforeNul(Text piece) {
+    return piece.substr(0, std::string_view{piece}.find('\0'));
+}
+
+/// The text of a line: what stands before its first carriage return, line feed or NUL.
+template <class Text>
+Text lineText(Text piece) {
+    for (const char end : {'\n', '\r', '\0'}) {
+        piece = piece.substr(0, std::string_view{piece}.find(end));
+    }
+    return piece;
+}
