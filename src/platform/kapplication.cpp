@@ -1,7 +1,5 @@
 #include "platform/kapplication.h"
 
-#include "base/bulkmemory.h"
-
 #include <QAbstractButton>
 #include <QApplication>
 #include <QDir>
@@ -138,12 +136,10 @@ private:
 };
 
 /// The toolkit paints large areas in threads of its pool, and would wait for ever for one that
-/// could not be started: they are started here, and stay. Throws std::bad_alloc where there is no
-/// memory for them and the first window.
+/// could not be started: they are started here, and stay. Throws std::bad_alloc where that
+/// cannot be done.
 void startPaintingThreads() {
     constexpr int count = 2; // One alone would make the start longer by some milliseconds.
-    constexpr std::size_t forWindow = std::size_t{48} << 20; // With two stacks of the usual 8 MB.
-    leaveMemoryBeside(0, forWindow);
     try {
         std::thread{[] {}}.join(); // The pool itself does not survive a thread that does not start.
     } catch (const std::system_error &) {

@@ -1,6 +1,5 @@
 #include "platform/qlistbox.h"
 
-#include "base/bulkmemory.h"
 #include "platform/bytetext.h"
 
 #include <QAbstractListModel>
@@ -96,10 +95,7 @@ private:
     template <class Container>
     static void makeRoom(Container &container, std::size_t size) {
         if (size > container.capacity()) {
-            const std::size_t room = size + size / 8;
-            leaveMemoryForToolkit(room * sizeof(typename Container::value_type));
-            container.reserve(room);
-            adviseLargePages(container.data(), room * sizeof(typename Container::value_type));
+            container.reserve(size + size / 8);
         }
     }
 
