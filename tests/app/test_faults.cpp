@@ -421,6 +421,9 @@ private slots:
                 waitid(P_PID, static_cast<id_t>(program.number), &status,
                        WSTOPPED | WEXITED | WNOWAIT | __WALL);
                 const std::string before = state();
+                if (signal == SIGINT && before.starts_with("1111")) {
+                    continue; // It may be over: a command that runs keeps this one away.
+                }
                 ::kill(program.number, signal);
                 ::kill(program.number, SIGCONT);
                 QCOMPARE(program.end(), -signal);
