@@ -4,7 +4,6 @@
 #include <array>
 #include <cctype>
 #include <cstdlib>
-#include <new>
 
 namespace {
 
@@ -60,12 +59,8 @@ std::optional<std::string> textSetting(std::optional<std::string> &field, TextOr
     if (!text) {
         return field;
     }
-    try {
-        field = std::string{*text};
-    } catch (const std::bad_alloc &) {
-        field.reset();
-        throw;
-    }
+    field.reset();
+    field.emplace(*text);
     return std::nullopt;
 }
 
