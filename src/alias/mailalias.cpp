@@ -22,10 +22,6 @@ MailAlias::MailAlias(QWidget *parent, const char *name)
     newPageLayout(this)->addWidget(group_);
 }
 
-void MailAlias::loadValues() {}
-
-void MailAlias::storeValues() {}
-
 void MailAlias::MailAliasAdd() { aliases_.add(); }
 
 void MailAlias::MailAliasRemove() { aliases_.removeCurrent(); }

@@ -14,8 +14,8 @@ class MailAlias : public KConfigWidget {
 public:
     MailAlias(QWidget *parent, const char *name);
 
-    void loadValues() override;
-    void storeValues() override;
+    void loadValues() override {}
+    void storeValues() override {}
 
 public slots:
     void MailAliasAdd();

@@ -63,10 +63,10 @@ constexpr std::array<PageRow, 7> pageRows{
 /// Delivery stores before the fetchers, unlike the order of the tabs.
 constexpr std::array<std::size_t, pageRows.size()> storeOrder{0, 1, 2, 4, 3, 5, 6};
 
-std::vector<const char *> pageNames() {
-    std::vector<const char *> names;
+QStringList pageNames() {
+    QStringList names;
     for (const PageRow &row : pageRows) {
-        names.push_back(row.name);
+        names << row.name;
     }
     return names;
 }

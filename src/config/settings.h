@@ -45,15 +45,23 @@ private:
 /// What one unit in the file stands for in the store.
 enum class Scale : int {};
 
+/// A setting whose handler needs nothing but its value.
+template <class Value, std::optional<std::string> (*handler)(Value &, TextOrNone)>
+struct HandledSetting : Setting {
+    HandledSetting(SettingTable &table, const char *key, Value standard = {})
+        : Setting{table, key}, value{standard} {}
+    std::optional<std::string> exchange(TextOrNone text) override { return handler(value, text); }
+    Value value;
+};
+
 /// Absent until the file gives it. Absent and empty differ: an absent text leaves the template's
 /// line for the key as it is.
-struct TextSetting : Setting {
-    TextSetting(SettingTable &table, const char *key) : Setting{table, key} {}
-    std::optional<std::string> exchange(TextOrNone text) override {
-        return textSetting(value, text);
-    }
-    std::optional<std::string> value;
-};
+using TextSetting = HandledSetting<std::optional<std::string>, textSetting>;
+/// Holds 0 or 1.
+using BoolSetting = HandledSetting<std::int32_t, boolSetting>;
+/// Holds hour * 256 + minute.
+using TimeSetting = HandledSetting<std::int32_t, timeSetting>;
+using AccessListSetting = HandledSetting<std::optional<AccessList>, accessListSetting>;
 
 struct NumberSetting : Setting {
     NumberSetting(SettingTable &table, const char *key, std::int32_t standard,
@@ -64,33 +72,6 @@ struct NumberSetting : Setting {
     }
     std::int32_t value;
     Scale scale;
-};
-
-/// Holds 0 or 1.
-struct BoolSetting : Setting {
-    BoolSetting(SettingTable &table, const char *key, bool standard)
-        : Setting{table, key}, value{standard ? 1 : 0} {}
-    std::optional<std::string> exchange(TextOrNone text) override {
-        return boolSetting(value, text);
-    }
-    std::int32_t value;
-};
-
-/// Holds hour * 256 + minute.
-struct TimeSetting : Setting {
-    TimeSetting(SettingTable &table, const char *key) : Setting{table, key} {}
-    std::optional<std::string> exchange(TextOrNone text) override {
-        return timeSetting(value, text);
-    }
-    std::int32_t value = 0;
-};
-
-struct AccessListSetting : Setting {
-    AccessListSetting(SettingTable &table, const char *key) : Setting{table, key} {}
-    std::optional<std::string> exchange(TextOrNone text) override {
-        return accessListSetting(value, text);
-    }
-    std::optional<AccessList> value;
 };
 
 /// Every key that the product's services share, each once, with its type and default. A member is

@@ -39,8 +39,6 @@ MailFetch::MailFetch(QWidget *parent, const char *name)
     newPageLayout(this)->addWidget(group_);
 }
 
-void MailFetch::loadValues() {}
-
 void MailFetch::storeValues() {
     settings().pop_time.value = pollTime_->getValue();
     if (popHostsAreWhole()) {

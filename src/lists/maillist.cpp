@@ -22,10 +22,6 @@ MailList::MailList(QWidget *parent, const char *name)
     newPageLayout(this)->addWidget(group_);
 }
 
-void MailList::loadValues() {}
-
-void MailList::storeValues() {}
-
 void MailList::MailListAdd() { lists_.add(); }
 
 void MailList::MailListRemove() { lists_.removeCurrent(); }

@@ -14,8 +14,8 @@ class MailList : public KConfigWidget {
 public:
     MailList(QWidget *parent, const char *name);
 
-    void loadValues() override;
-    void storeValues() override;
+    void loadValues() override {}
+    void storeValues() override {}
 
 public slots:
     void MailListAdd();

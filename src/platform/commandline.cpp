@@ -22,14 +22,10 @@ namespace {
 } // namespace
 
 CommandLine parseCommandLine(int argc, char **argv, const char *name,
-                             const std::vector<const char *> &pageNames) {
+                             const QStringList &pageNames) {
     QStringList arguments;
     for (int index = 0; index < argc; ++index) {
         arguments << QFile::decodeName(argv[index]);
-    }
-    QStringList pages;
-    for (const char *page : pageNames) {
-        pages << QString::fromUtf8(page);
     }
     const QCommandLineOption init{"init", "Read the files, show nothing, end."};
     const QCommandLineOption help{{"h", "help"}, "Print this text."};
@@ -37,7 +33,7 @@ CommandLine parseCommandLine(int argc, char **argv, const char *name,
     QCommandLineParser parser;
     parser.setSingleDashWordOptionMode(QCommandLineParser::ParseAsLongOptions);
     parser.addOptions({init, help, version});
-    parser.addPositionalArgument("PAGE", "Show these pages alone: " + pages.join(", ") + '.',
+    parser.addPositionalArgument("PAGE", "Show these pages alone: " + pageNames.join(", ") + '.',
                                  "[PAGE...]");
     if (!parser.parse(arguments)) {
         refuse(name, parser.errorText());
@@ -50,13 +46,11 @@ CommandLine parseCommandLine(int argc, char **argv, const char *name,
     if (parser.isSet(version)) {
         print(QStringLiteral("%1 " TARVEX_VERSION "\n").arg(name));
     }
-    CommandLine commandLine{parser.isSet(init), {}};
     for (const QString &page : parser.positionalArguments()) {
-        if (!pages.contains(page)) {
+        if (!pageNames.contains(page)) {
             refuse(name, QStringLiteral("unknown page \"%1\"; the pages are %2")
-                             .arg(page, pages.join(", ")));
+                             .arg(page, pageNames.join(", ")));
         }
-        commandLine.pages.push_back(page.toStdString());
     }
-    return commandLine;
+    return {.isInitOnly = parser.isSet(init), .pages = parser.positionalArguments()};
 }

@@ -1,16 +1,14 @@
 #pragma once
 
-#include <string>
-#include <vector>
+#include <QStringList>
 
 /// What the command line asks for.
 struct CommandLine {
     bool isInitOnly = false;
-    std::vector<std::string> pages; ///< Empty when all pages are wanted.
+    QStringList pages; ///< Empty when all pages are wanted.
 };
 
 /// "-init" (or "--init") is the init-only mode; "-h" and "-v" (or "--help" and "--version") print
 /// and end the process with 0. Every other argument names a page, one of `pageNames`. An unknown
 /// option or page ends the process with 2 and one line on standard error.
-CommandLine parseCommandLine(int argc, char **argv, const char *name,
-                             const std::vector<const char *> &pageNames);
+CommandLine parseCommandLine(int argc, char **argv, const char *name, const QStringList &pageNames);

@@ -7,10 +7,8 @@
 #include <QIcon>
 #include <QWindow>
 
-#include <algorithm>
-
 KControlApplication::KControlApplication(int &argc, char **argv, const char *name,
-                                         const std::vector<const char *> &pageNames)
+                                         const QStringList &pageNames)
     : KControlApplication{argc > 0 ? argv[0] : name, name,
                           parseCommandLine(argc, argv, name, pageNames)} {}
 
@@ -51,8 +49,7 @@ void KControlApplication::help() {
 void KControlApplication::defaultValues() {}
 
 bool KControlApplication::isPageRequested(const char *name) const {
-    return requestedPages_.empty() ||
-           std::ranges::find(requestedPages_, name) != requestedPages_.end();
+    return requestedPages_.isEmpty() || requestedPages_.contains(QLatin1String{name});
 }
 
 QWidget *KControlApplication::dialog() const { return dialog_.get(); }

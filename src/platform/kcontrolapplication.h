@@ -3,9 +3,6 @@
 #include "platform/commandline.h"
 #include "platform/kapplication.h"
 
-#include <string>
-#include <vector>
-
 class KConfigWidget;
 class KControlDialog;
 class QWidget;
@@ -16,8 +13,7 @@ class QWidget;
 class KControlApplication : public KApplication {
 public:
     /// `pageNames` are the names that the command line may ask for.
-    KControlApplication(int &argc, char **argv, const char *name,
-                        const std::vector<const char *> &pageNames);
+    KControlApplication(int &argc, char **argv, const char *name, const QStringList &pageNames);
     ~KControlApplication() override;
 
     [[nodiscard]] bool isInitOnly() const { return dialog_ == nullptr; }
@@ -50,6 +46,6 @@ protected:
 private:
     KControlApplication(const char *program, const char *name, CommandLine commandLine);
 
-    std::vector<std::string> requestedPages_;
+    QStringList requestedPages_;
     std::unique_ptr<KControlDialog> dialog_;
 };

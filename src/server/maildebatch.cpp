@@ -21,7 +21,3 @@ MailDebatch::MailDebatch(QWidget *parent, const char *name)
     form_.text("&From Header force:", settings().mail_from_force);
     form_.pageLayout()->addStretch();
 }
-
-void MailDebatch::loadValues() {}
-
-void MailDebatch::storeValues() { form_.store(); }

@@ -10,7 +10,3 @@ MailIMAP::MailIMAP(QWidget *parent, const char *name)
                         settings().imap_allow, nullptr, settings().imap_block})} {
     form_.pageLayout()->addStretch();
 }
-
-void MailIMAP::loadValues() {}
-
-void MailIMAP::storeValues() { form_.store(); }

@@ -10,8 +10,8 @@ class MailIMAP : public KConfigWidget {
 public:
     MailIMAP(QWidget *parent, const char *name);
 
-    void loadValues() override;
-    void storeValues() override;
+    void loadValues() override {}
+    void storeValues() override { form_.store(); }
 
 private:
     SettingsForm form_;

@@ -10,7 +10,3 @@ MailPOP3::MailPOP3(QWidget *parent, const char *name)
                         nullptr, settings().pop_block})} {
     form_.pageLayout()->addStretch();
 }
-
-void MailPOP3::loadValues() {}
-
-void MailPOP3::storeValues() { form_.store(); }

@@ -10,8 +10,8 @@ class MailPOP3 : public KConfigWidget {
 public:
     MailPOP3(QWidget *parent, const char *name);
 
-    void loadValues() override;
-    void storeValues() override;
+    void loadValues() override {}
+    void storeValues() override { form_.store(); }
 
 private:
     SettingsForm form_;

@@ -30,10 +30,6 @@ MailSMTP::MailSMTP(QWidget *parent, const char *name)
     form_.pageLayout()->addStretch(1);
 }
 
-void MailSMTP::loadValues() {}
-
-void MailSMTP::storeValues() { form_.store(); }
-
 void MailSMTP::Add() { rejects_.add(); }
 
 void MailSMTP::Remove() { rejects_.removeCurrent(); }

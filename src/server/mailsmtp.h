@@ -15,8 +15,8 @@ class MailSMTP : public KConfigWidget {
 public:
     MailSMTP(QWidget *parent, const char *name);
 
-    void loadValues() override;
-    void storeValues() override;
+    void loadValues() override {}
+    void storeValues() override { form_.store(); }
 
 public slots:
     void Add();
