@@ -20,7 +20,7 @@ EditAlias::EditAlias(QWidget *parent, const char *name, const alias_entry *alias
     : FormDialog(parent, name, "Email Address Aliasing"),
       address_{addField(translatable("&Address:"), {70, 18},
                         alias != nullptr ? alias->address : KeptText{})},
-      group_{new ListGroup("Aliases", {250, 70}, this)},
+      group_{new ListGroup("Aliases", {.box = 250, .column = 70}, this)},
       targetRows_{this, group_->box(), &targets_.head, shown, &EditAlias::Read} {
     address_->setRule(aliasAddressRule());
     group_->addEditButtons<EditAlias>(this, {.add = &EditAlias::Add,

@@ -11,7 +11,7 @@ KeptText shown(const alias_entry &alias) { return alias.address; }
 
 MailAlias::MailAlias(QWidget *parent, const char *name)
     : KConfigWidget(parent, name),
-      group_{new ListGroup("Mail Aliasing", {600, 100}, this)},
+      group_{new ListGroup("Mail Aliasing", {.box = 600, .column = 100}, this)},
       aliases_{this, group_->box(), &alias_list.head, shown, &MailAlias::MailAliasRead} {
     aliases_.fill();
     group_->addEditButtons<MailAlias>(this, {.add = &MailAlias::MailAliasAdd,

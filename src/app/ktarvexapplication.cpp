@@ -51,14 +51,34 @@ struct PageRow {
 };
 
 /// In the order of the tabs.
-constexpr std::array<PageRow, 7> pageRows{
-    {{newPage<MailSMTP>, "smtpserver", "&SMTP", "tarvex-mail-smtp.html"},
-     {newPage<MailPOP3>, "pop3server", "&POP3", "tarvex-mail-pop3.html"},
-     {newPage<MailIMAP>, "imapserver", "&IMAP", "tarvex-mail-imap.html"},
-     {newPage<MailFetch>, "fetch", "Fetchers", "tarvex-mail-fetchers.html"},
-     {newPage<MailDebatch>, "debatch", "&Delivery", "tarvex-mail-delivery.html"},
-     {newPage<MailAlias>, "alias", "&Aliasing", "tarvex-mail-alias.html"},
-     {newPage<MailList>, "list", "&Mail List", "tarvex-mail-list.html"}}};
+constexpr std::array<PageRow, 7> pageRows{{{.newPage = newPage<MailSMTP>,
+                                            .name = "smtpserver",
+                                            .label = "&SMTP",
+                                            .helpFile = "tarvex-mail-smtp.html"},
+                                           {.newPage = newPage<MailPOP3>,
+                                            .name = "pop3server",
+                                            .label = "&POP3",
+                                            .helpFile = "tarvex-mail-pop3.html"},
+                                           {.newPage = newPage<MailIMAP>,
+                                            .name = "imapserver",
+                                            .label = "&IMAP",
+                                            .helpFile = "tarvex-mail-imap.html"},
+                                           {.newPage = newPage<MailFetch>,
+                                            .name = "fetch",
+                                            .label = "Fetchers",
+                                            .helpFile = "tarvex-mail-fetchers.html"},
+                                           {.newPage = newPage<MailDebatch>,
+                                            .name = "debatch",
+                                            .label = "&Delivery",
+                                            .helpFile = "tarvex-mail-delivery.html"},
+                                           {.newPage = newPage<MailAlias>,
+                                            .name = "alias",
+                                            .label = "&Aliasing",
+                                            .helpFile = "tarvex-mail-alias.html"},
+                                           {.newPage = newPage<MailList>,
+                                            .name = "list",
+                                            .label = "&Mail List",
+                                            .helpFile = "tarvex-mail-list.html"}}};
 
 /// Delivery stores before the fetchers, unlike the order of the tabs.
 constexpr std::array<std::size_t, pageRows.size()> storeOrder{0, 1, 2, 4, 3, 5, 6};

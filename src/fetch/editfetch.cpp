@@ -38,8 +38,8 @@ EditFetch::EditFetch(QWidget *parent, const char *name, const pop_host *host)
     user_->setRule(userRule);
 }
 
-std::string EditFetch::server() const { return server_->bytes(); }
-
-std::string EditFetch::user() const { return user_->bytes(); }
-
-std::string EditFetch::password() const { return password_->bytes(); }
+void EditFetch::store(pop_host &host) const {
+    setPopHostText(host.server, server_->bytes());
+    setPopHostText(host.user, user_->bytes());
+    setPopHostText(host.password, password_->bytes());
+}

@@ -2,8 +2,6 @@
 
 #include "widgets/formdialog.h"
 
-#include <string>
-
 struct pop_host;
 
 /// Asks for one fetcher. The fields take only what the fetcher list can carry.
@@ -14,9 +12,8 @@ public:
     /// `host` is what the fields start with; null for empty fields.
     EditFetch(QWidget *parent, const char *name, const pop_host *host);
 
-    [[nodiscard]] std::string server() const;
-    [[nodiscard]] std::string user() const;
-    [[nodiscard]] std::string password() const;
+    /// Copies the fields into the record; its flags stay.
+    void store(pop_host &host) const;
 
 private:
     TextField *server_;

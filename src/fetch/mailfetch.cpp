@@ -19,7 +19,7 @@ std::string_view shown(const pop_host &host) { return popHostText(host.user); }
 
 MailFetch::MailFetch(QWidget *parent, const char *name)
     : KConfigWidget(parent, name),
-      group_{new ListGroup("POP3 Mail Fetchers", {600, columnWidth}, this)},
+      group_{new ListGroup("POP3 Mail Fetchers", {.box = 600, .column = columnWidth}, this)},
       fetchers_{this, group_->box(), &pop_host_list.head, shown, &MailFetch::MailFetchRead},
       pollTime_{newNumberField(nullptr, 0, 999, settings().pop_time.value)} {
     fetchers_.fill();
@@ -56,8 +56,6 @@ void MailFetch::MailFetchModify() { fetchers_.changeCurrent(); }
 
 void MailFetch::MailFetchRead(pop_host *host, EditFetch *dialog) {
     if (host != nullptr && dialog != nullptr) {
-        setPopHostText(host->server, dialog->server());
-        setPopHostText(host->user, dialog->user());
-        setPopHostText(host->password, dialog->password());
+        dialog->store(*host);
     }
 }

@@ -12,7 +12,7 @@ maillist_addr_entry copyOf(const maillist_addr_entry &entry) { return {entry.add
 } // namespace
 
 AddressGroup::AddressGroup(const Kind &kind, EditList *editor, const maillist_entry &list)
-    : ListGroup(kind.caption, {1000, 0}, editor, Shrinking::Yes),
+    : ListGroup(kind.caption, {.box = 1000, .column = 0}, editor, Shrinking::Yes),
       chain_{(list.*kind.chain).copied(copyOf)} {
     box()->setMinimumSize(minimumBox);
     // The box takes what height there is; only the buttons beside it ask for some.

@@ -64,9 +64,14 @@ struct Trigger {
 };
 
 constexpr int maximumTrigger = 1024;
-constexpr std::array<Trigger, 2> triggers{
-    {{"Digest size trigger:", " kB", 30, &maillist_entry::diglen},
-     {"Digest count trigger:", " messages", 100, &maillist_entry::digno}}};
+constexpr std::array<Trigger, 2> triggers{{{.caption = "Digest size trigger:",
+                                            .unit = " kB",
+                                            .unitWidth = 30,
+                                            .field = &maillist_entry::diglen},
+                                           {.caption = "Digest count trigger:",
+                                            .unit = " messages",
+                                            .unitWidth = 100,
+                                            .field = &maillist_entry::digno}}};
 
 constexpr std::array<AddressGroup::Kind, 3> addressKinds{
     {{.caption = "List Members",

@@ -5,7 +5,7 @@
 #include "lists/editlistmember.h"
 #include "lists/listload.h"
 #include "lists/listsearch.h"
-#include "platform/helpkey.h"
+#include "platform/kcontroldialog.h"
 
 #include <QMessageBox>
 #include <QPushButton>

@@ -11,7 +11,7 @@ KeptText shown(const maillist_entry &list) { return list.name; }
 
 MailList::MailList(QWidget *parent, const char *name)
     : KConfigWidget(parent, name),
-      group_{new ListGroup("Mail Listing", {600, 100}, this)},
+      group_{new ListGroup("Mail Listing", {.box = 600, .column = 100}, this)},
       lists_{this, group_->box(), &maillist_list.head, shown, &MailList::MailListRead} {
     lists_.fill();
     group_->addEditButtons<MailList>(this, {.add = &MailList::MailListAdd,

@@ -1,7 +1,6 @@
 #include "platform/kcontroldialog.h"
 
 #include "platform/droppedinput.h"
-#include "platform/helpkey.h"
 #include "platform/helpwindow.h"
 #include "platform/kconfigwidget.h"
 #include "platform/lowscreen.h"
@@ -11,6 +10,7 @@
 #include <QLabel>
 #include <QPushButton>
 #include <QScrollArea>
+#include <QShortcut>
 #include <QShortcutEvent>
 #include <QTabBar>
 #include <QTabWidget>
@@ -121,4 +121,15 @@ void KControlDialog::apply() {
     emit applied();
     QApplication::restoreOverrideCursor();
     dropPendingInput();
+}
+
+void addHelpKey(QDialog *dialog) {
+    QWidget *ancestor = dialog;
+    while (ancestor != nullptr && qobject_cast<KControlDialog *>(ancestor) == nullptr) {
+        ancestor = ancestor->parentWidget();
+    }
+    if (auto *module = qobject_cast<KControlDialog *>(ancestor)) {
+        QObject::connect(new QShortcut(QKeySequence(Qt::Key_F1), dialog), &QShortcut::activated,
+                         module, &KControlDialog::helpWanted);
+    }
 }

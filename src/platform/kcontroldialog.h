@@ -54,3 +54,7 @@ private:
     QStringList helpFiles_; ///< One for each tab.
     std::unique_ptr<HelpWindow> helpWindow_;
 };
+
+/// Makes F1 show the current page's help from within the dialog, be that the control module's own
+/// or one that was opened from it.
+void addHelpKey(QDialog *dialog);

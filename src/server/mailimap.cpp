@@ -5,8 +5,12 @@
 MailIMAP::MailIMAP(QWidget *parent, const char *name)
     : KConfigWidget(parent, name),
       form_{serverForm(this, "IMAP Server Settings",
-                       {settings().imap_sock_enabled, settings().imap_sock_port,
-                        settings().imap_sock_timeout, settings().imap_sock_max,
-                        settings().imap_allow, nullptr, settings().imap_block})} {
+                       {.enabled = settings().imap_sock_enabled,
+                        .port = settings().imap_sock_port,
+                        .timeout = settings().imap_sock_timeout,
+                        .maximum = settings().imap_sock_max,
+                        .allow = settings().imap_allow,
+                        .auth = nullptr,
+                        .block = settings().imap_block})} {
     form_.pageLayout()->addStretch();
 }

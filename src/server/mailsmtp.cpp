@@ -15,10 +15,14 @@ KeptText shown(const smtpreject_entry &entry) { return entry.domain; }
 MailSMTP::MailSMTP(QWidget *parent, const char *name)
     : KConfigWidget(parent, name),
       form_{serverForm(this, "SMTP Server Settings",
-                       {settings().smtp_sock_enabled, settings().smtp_sock_port,
-                        settings().smtp_sock_timeout, settings().smtp_sock_max,
-                        settings().smtp_allow, &settings().smtp_auth, settings().smtp_block})},
-      group_{new ListGroup("SMTP Domain Blocking", {6, 1}, this)},
+                       {.enabled = settings().smtp_sock_enabled,
+                        .port = settings().smtp_sock_port,
+                        .timeout = settings().smtp_sock_timeout,
+                        .maximum = settings().smtp_sock_max,
+                        .allow = settings().smtp_allow,
+                        .auth = &settings().smtp_auth,
+                        .block = settings().smtp_block})},
+      group_{new ListGroup("SMTP Domain Blocking", {.box = 6, .column = 1}, this)},
       rejects_{this, group_->box(), &smtpreject_list.head, shown, &MailSMTP::Read} {
     rejects_.fill();
     group_->addEditButtons<MailSMTP>(this, {.add = &MailSMTP::Add,

@@ -1,6 +1,6 @@
 #include "widgets/formdialog.h"
 
-#include "platform/helpkey.h"
+#include "platform/kcontroldialog.h"
 #include "platform/lowscreen.h"
 #include "widgets/minimumsize.h"
 #include "widgets/textfield.h"
