@@ -30,7 +30,6 @@ std::uint8_t typeByContent(std::string_view word) {
     return word.find('$') != std::string_view::npos ? ALIAS_LIST_POSTING : ALIAS_PLAIN;
 }
 
-/// Takes the target that `rest` begins with.
 alias_list_entry takeTarget(KeptText &rest) {
     alias_list_entry target;
     if (rest.starts_with('!')) {

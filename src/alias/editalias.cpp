@@ -4,8 +4,6 @@
 #include "alias/editaliasentry.h"
 #include "widgets/textfield.h"
 
-#include <QVBoxLayout>
-
 namespace {
 
 KeptText shown(const alias_list_entry &target) { return target.alias; }
@@ -23,10 +21,8 @@ EditAlias::EditAlias(QWidget *parent, const char *name, const alias_entry *alias
       group_{new ListGroup("Aliases", {.box = 250, .column = 70}, this)},
       targetRows_{this, group_->box(), &targets_.head, shown, &EditAlias::Read} {
     address_->setRule(aliasAddressRule());
-    group_->addEditButtons<EditAlias>(this, {.add = &EditAlias::Add,
-                                             .modify = &EditAlias::Modify,
-                                             .remove = &EditAlias::Remove,
-                                             .selected = &EditAlias::Selected});
+    group_->addEditButtons(this, &EditAlias::Add, &EditAlias::Modify, &EditAlias::Remove,
+                           &EditAlias::Selected);
     group_->column()->addStretch(100);
     rows()->addWidget(group_);
     if (alias != nullptr) {

@@ -14,10 +14,8 @@ MailAlias::MailAlias(QWidget *parent, const char *name)
       group_{new ListGroup("Mail Aliasing", {.box = 600, .column = 100}, this)},
       aliases_{this, group_->box(), &alias_list.head, shown, &MailAlias::MailAliasRead} {
     aliases_.fill();
-    group_->addEditButtons<MailAlias>(this, {.add = &MailAlias::MailAliasAdd,
-                                             .modify = &MailAlias::MailAliasModify,
-                                             .remove = &MailAlias::MailAliasRemove,
-                                             .selected = &MailAlias::MailAliasSelected});
+    group_->addEditButtons(this, &MailAlias::MailAliasAdd, &MailAlias::MailAliasModify,
+                           &MailAlias::MailAliasRemove, &MailAlias::MailAliasSelected);
     group_->column()->addStretch(100);
     newPageLayout(this)->addWidget(group_);
 }

@@ -17,8 +17,6 @@
 #include "server/mailsmtp.h"
 #include "server/smtprejectfile.h"
 
-#include <array>
-
 namespace {
 
 void readFiles() {

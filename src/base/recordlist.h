@@ -89,7 +89,6 @@ Record **findRecord(Record **head, Matches matches) {
     return head;
 }
 
-/// Unlinks the record that `*link` points to and frees it.
 template <class Record>
 void removeRecord(Record **link) {
     Record *record = *link;
@@ -154,10 +153,6 @@ struct RecordChain {
 /// Puts the records of `front` before those of the list.
 template <class Record>
 void prependChain(Record **head, RecordChain<Record> front) {
-    Record **end = &front.head;
-    while (*end != nullptr) {
-        end = &(*end)->next;
-    }
-    *end = *head;
+    *findRecord(&front.head, [](const Record &) { return false; }) = *head;
     *head = std::exchange(front.head, nullptr);
 }

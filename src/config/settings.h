@@ -28,11 +28,6 @@ private:
 /// The settings in the order in which they were declared.
 class SettingTable {
 public:
-    SettingTable() = default;
-    SettingTable(const SettingTable &) = delete;
-    SettingTable &operator=(const SettingTable &) = delete;
-    ~SettingTable() = default;
-
     [[nodiscard]] const std::vector<Setting *> &all() const { return all_; }
     /// The first setting whose key is the given one, letter case aside; null when there is none.
     [[nodiscard]] Setting *find(const std::string &key) const;

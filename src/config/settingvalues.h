@@ -33,7 +33,6 @@ std::optional<std::string> accessListSetting(std::optional<AccessList> &field, T
 /// is null. The process's locale decides what is a letter.
 int compareNoCase(const char *a, const char *b);
 
-/// Decimal digits alone.
 std::string formatUnsigned(std::uint32_t value);
 
 /// The integer that begins the text, by the rules of the C library's atoi; a number that does

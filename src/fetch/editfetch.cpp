@@ -5,7 +5,6 @@
 
 namespace {
 
-/// A field for an array of `size` bytes.
 FieldRule ruleFor(std::size_t size) {
     const std::size_t maximum = size - 1;
     return {.refused = QStringLiteral(":@,"),

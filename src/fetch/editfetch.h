@@ -12,7 +12,6 @@ public:
     /// `host` is what the fields start with; null for empty fields.
     EditFetch(QWidget *parent, const char *name, const pop_host *host);
 
-    /// Copies the fields into the record; its flags stay.
     void store(pop_host &host) const;
 
 private:

@@ -23,10 +23,8 @@ MailFetch::MailFetch(QWidget *parent, const char *name)
       fetchers_{this, group_->box(), &pop_host_list.head, shown, &MailFetch::MailFetchRead},
       pollTime_{newNumberField(nullptr, 0, 999, settings().pop_time.value)} {
     fetchers_.fill();
-    group_->addEditButtons<MailFetch>(this, {.add = &MailFetch::MailFetchAdd,
-                                             .modify = &MailFetch::MailFetchModify,
-                                             .remove = &MailFetch::MailFetchRemove,
-                                             .selected = &MailFetch::MailFetchSelected});
+    group_->addEditButtons(this, &MailFetch::MailFetchAdd, &MailFetch::MailFetchModify,
+                           &MailFetch::MailFetchRemove, &MailFetch::MailFetchSelected);
 
     auto *label = new QLabel(QStringLiteral("Poll time (s):"));
     label->setBuddy(pollTime_);

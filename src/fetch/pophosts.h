@@ -29,7 +29,6 @@ struct pop_host {
 /// In the order of the text; the page puts new records at the head.
 extern RecordChain<pop_host> pop_host_list;
 
-/// The text in one of the record's arrays.
 template <std::size_t size>
 std::string_view popHostText(const std::array<char, size> &field) {
     return field.data();

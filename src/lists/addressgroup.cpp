@@ -18,7 +18,7 @@ AddressGroup::AddressGroup(const Kind &kind, EditList *editor, const maillist_en
     // The box takes what height there is; only the buttons beside it ask for some.
     box()->setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Ignored);
     RecordRows{editor, box(), &chain_.head, kind.shown, &EditList::Read}.fill();
-    addEditButtons(editor, kind.edit);
+    addEditButtons(editor, kind.add, kind.modify, kind.remove, kind.selected);
     connect(addButton("Search..."), &QPushButton::clicked, editor, kind.search);
     connect(addButton("Load File"), &QPushButton::clicked, editor, kind.load);
     fixColumnWidth(buttonWidth);

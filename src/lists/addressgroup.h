@@ -9,13 +9,14 @@ class EditList;
 /// them, and the five buttons.
 class AddressGroup : public ListGroup {
 public:
-    /// What the groups differ in.
     struct Kind {
         const char *caption;
         AddressChain maillist_entry::*chain;
-        /// The text of an address's row.
         KeptText (*shown)(const maillist_addr_entry &);
-        EditSlots<EditList> edit;
+        void (EditList::*add)();
+        void (EditList::*modify)();
+        void (EditList::*remove)();
+        void (EditList::*selected)(const char *);
         void (EditList::*search)();
         void (EditList::*load)();
     };

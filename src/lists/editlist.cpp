@@ -73,34 +73,33 @@ constexpr std::array<Trigger, 2> triggers{{{.caption = "Digest size trigger:",
                                             .unitWidth = 100,
                                             .field = &maillist_entry::digno}}};
 
-constexpr std::array<AddressGroup::Kind, 3> addressKinds{
-    {{.caption = "List Members",
-      .chain = &maillist_entry::member,
-      .shown = addressShown,
-      .edit = {.add = &EditList::MemberAdd,
-               .modify = &EditList::MemberModify,
-               .remove = &EditList::MemberRemove,
-               .selected = &EditList::MemberSelected},
-      .search = &EditList::MemberSearch,
-      .load = &EditList::MemberLoad},
-     {.caption = "Allowed Posters",
-      .chain = &maillist_entry::allow,
-      .shown = addressStored,
-      .edit = {.add = &EditList::AllowAdd,
-               .modify = &EditList::AllowModify,
-               .remove = &EditList::AllowRemove,
-               .selected = &EditList::AllowSelected},
-      .search = &EditList::AllowSearch,
-      .load = &EditList::AllowLoad},
-     {.caption = "Blocked Posters",
-      .chain = &maillist_entry::block,
-      .shown = addressStored,
-      .edit = {.add = &EditList::BlockAdd,
-               .modify = &EditList::BlockModify,
-               .remove = &EditList::BlockRemove,
-               .selected = &EditList::BlockSelected},
-      .search = &EditList::BlockSearch,
-      .load = &EditList::BlockLoad}}};
+constexpr std::array<AddressGroup::Kind, 3> addressKinds{{{.caption = "List Members",
+                                                           .chain = &maillist_entry::member,
+                                                           .shown = addressShown,
+                                                           .add = &EditList::MemberAdd,
+                                                           .modify = &EditList::MemberModify,
+                                                           .remove = &EditList::MemberRemove,
+                                                           .selected = &EditList::MemberSelected,
+                                                           .search = &EditList::MemberSearch,
+                                                           .load = &EditList::MemberLoad},
+                                                          {.caption = "Allowed Posters",
+                                                           .chain = &maillist_entry::allow,
+                                                           .shown = addressStored,
+                                                           .add = &EditList::AllowAdd,
+                                                           .modify = &EditList::AllowModify,
+                                                           .remove = &EditList::AllowRemove,
+                                                           .selected = &EditList::AllowSelected,
+                                                           .search = &EditList::AllowSearch,
+                                                           .load = &EditList::AllowLoad},
+                                                          {.caption = "Blocked Posters",
+                                                           .chain = &maillist_entry::block,
+                                                           .shown = addressStored,
+                                                           .add = &EditList::BlockAdd,
+                                                           .modify = &EditList::BlockModify,
+                                                           .remove = &EditList::BlockRemove,
+                                                           .selected = &EditList::BlockSelected,
+                                                           .search = &EditList::BlockSearch,
+                                                           .load = &EditList::BlockLoad}}};
 
 maillist_entry newList() {
     maillist_entry list;
@@ -121,7 +120,6 @@ QHBoxLayout *newRow(QVBoxLayout *rows) {
     return row;
 }
 
-/// The widgets below each other, with a group's spacing between them.
 template <class Widgets>
 QVBoxLayout *newSide(const Widgets &widgets) {
     auto *side = new QVBoxLayout;

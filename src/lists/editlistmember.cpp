@@ -6,7 +6,6 @@
 #include "widgets/textfield.h"
 
 #include <QCheckBox>
-#include <QVBoxLayout>
 
 #include <algorithm>
 

@@ -14,10 +14,8 @@ MailList::MailList(QWidget *parent, const char *name)
       group_{new ListGroup("Mail Listing", {.box = 600, .column = 100}, this)},
       lists_{this, group_->box(), &maillist_list.head, shown, &MailList::MailListRead} {
     lists_.fill();
-    group_->addEditButtons<MailList>(this, {.add = &MailList::MailListAdd,
-                                            .modify = &MailList::MailListModify,
-                                            .remove = &MailList::MailListRemove,
-                                            .selected = &MailList::MailListSelected});
+    group_->addEditButtons(this, &MailList::MailListAdd, &MailList::MailListModify,
+                           &MailList::MailListRemove, &MailList::MailListSelected);
     group_->column()->addStretch();
     newPageLayout(this)->addWidget(group_);
 }

@@ -30,7 +30,6 @@ struct maillist_addr_entry {
 /// Whether a member gets the digest rather than each message.
 inline bool isOnDigest(const maillist_addr_entry &member) { return member.addr.starts_with(':'); }
 
-/// An address as its record holds it.
 inline KeptText addressStored(const maillist_addr_entry &entry) { return entry.addr; }
 
 /// A member's address proper.

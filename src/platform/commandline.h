@@ -2,7 +2,6 @@
 
 #include <QStringList>
 
-/// What the command line asks for.
 struct CommandLine {
     bool isInitOnly = false;
     QStringList pages; ///< Empty when all pages are wanted.

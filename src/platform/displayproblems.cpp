@@ -1,9 +1,7 @@
 #include "platform/displayproblems.h"
 
-#include <QByteArray>
 #include <QString>
 
-#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 #include <utility>
@@ -11,32 +9,18 @@
 
 namespace {
 
-struct Message {
-    QtMsgType type;
-    QByteArray category;
-    QString text;
-};
-
 const char *name = nullptr;
 QtMessageHandler before = nullptr;
-std::vector<Message> held;
+std::vector<std::pair<QtMsgType, QString>> held;
 
-[[noreturn]] void end() {
-    std::fprintf(stderr, "%s: no display can be opened\n", name);
-    // A platform that was found has said what is wrong before its loader does, which knows no more
-    // and advises to install the program again.
-    const auto loader = std::ranges::find(held, "qt.qpa.plugin", &Message::category);
-    const auto last = loader == held.begin() ? held.end() : loader;
-    for (auto message = held.begin(); message != last; ++message) {
-        std::fprintf(stderr, "%s\n", qPrintable(message->text.trimmed()));
-    }
-    std::_Exit(1);
-}
-
-void hold(QtMsgType type, const QMessageLogContext &where, const QString &text) {
-    held.push_back({.type = type, .category = where.category, .text = text});
+void hold(QtMsgType type, const QMessageLogContext & /*where*/, const QString &text) {
+    held.emplace_back(type, text);
     if (type == QtFatalMsg) {
-        end();
+        std::fprintf(stderr, "%s: no display can be opened\n", name);
+        for (const auto &[heldType, heldText] : held) {
+            std::fprintf(stderr, "%s\n", qPrintable(heldText.trimmed()));
+        }
+        std::_Exit(1);
     }
 }
 
@@ -49,7 +33,7 @@ DisplayProblems::DisplayProblems(const char *program) {
 
 DisplayProblems::~DisplayProblems() {
     qInstallMessageHandler(before);
-    for (const Message &message : std::exchange(held, {})) {
-        qt_message_output(message.type, {}, message.text);
+    for (const auto &[type, text] : std::exchange(held, {})) {
+        qt_message_output(type, {}, text);
     }
 }

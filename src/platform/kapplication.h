@@ -25,7 +25,6 @@ public:
     /// found from the program's own place, so that a build tree works like an installation.
     static QString shared(const QString &name);
 
-    /// The name that the application was made with.
     [[nodiscard]] QString name() const;
 
 private:

@@ -26,7 +26,6 @@ public:
     virtual void init();
     /// What OK and Apply do; nothing here.
     virtual void applyChanges();
-    /// Shows the current page's help file.
     virtual void help();
     virtual void defaultValues();
 
@@ -40,7 +39,6 @@ protected:
     /// A line that the dialog shows above its buttons; to be called before it is shown.
     void setNote(const QString &text);
 
-    /// Shows the dialog with the pages it has by now.
     void showDialog();
 
 private:

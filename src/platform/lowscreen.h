@@ -9,7 +9,6 @@ class QWidget;
 /// window manager's frame, as far as that is known before the window is shown.
 QSize availableSize(const QWidget *window);
 
-/// Whether both the width and the height fit.
 inline bool fitsInto(QSize available, QSize window) {
     return window.boundedTo(available) == window;
 }

@@ -25,7 +25,6 @@ std::array<SignalHandler, 2> writeSignals{{{SIGPIPE, SIG_IGN}, {SIGXFSZ, SIG_IGN
 // end the process there.
 std::array<SignalHandler, 3> endSignals{{{SIGTERM, hold}, {SIGINT, hold}, {SIGHUP, hold}}};
 
-/// Puts the other handlers to use.
 template <std::size_t count>
 void exchange(std::array<SignalHandler, count> &handlers) {
     for (auto &[signal, other] : handlers) {

@@ -4,8 +4,6 @@
 #include "server/serverform.h"
 #include "server/smtprejectfile.h"
 
-#include <QVBoxLayout>
-
 namespace {
 
 KeptText shown(const smtpreject_entry &entry) { return entry.domain; }
@@ -25,10 +23,8 @@ MailSMTP::MailSMTP(QWidget *parent, const char *name)
       group_{new ListGroup("SMTP Domain Blocking", {.box = 6, .column = 1}, this)},
       rejects_{this, group_->box(), &smtpreject_list.head, shown, &MailSMTP::Read} {
     rejects_.fill();
-    group_->addEditButtons<MailSMTP>(this, {.add = &MailSMTP::Add,
-                                            .modify = &MailSMTP::Modify,
-                                            .remove = &MailSMTP::Remove,
-                                            .selected = &MailSMTP::Selected});
+    group_->addEditButtons(this, &MailSMTP::Add, &MailSMTP::Modify, &MailSMTP::Remove,
+                           &MailSMTP::Selected);
     group_->column()->addStretch();
     form_.pageLayout()->addWidget(group_);
     form_.pageLayout()->addStretch(1);

@@ -13,5 +13,4 @@ struct ServerSettings {
     AccessListSetting &block;
 };
 
-/// The form of a mail server's settings in one group.
 SettingsForm serverForm(QWidget *page, const char *caption, const ServerSettings &server);

@@ -10,7 +10,6 @@
 class QLabel;
 class QWidget;
 
-/// The caption in the user's language.
 QString translated(TranslatableText caption);
 
 /// What a caption calls its field: without "&", and without ":" or "..." at its end.

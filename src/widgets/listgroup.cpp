@@ -3,8 +3,6 @@
 #include "widgets/captions.h"
 #include "widgets/minimumsize.h"
 
-#include <algorithm>
-
 namespace {
 
 /// For a button in a group that shrinks.

@@ -30,22 +30,15 @@ public:
     /// text in it needs.
     void fixColumnWidth(int width);
 
-    /// The slots that a list's three buttons, and a row that was chosen, lead to.
+    /// Adds the three buttons that every list has and sends them, and a row that was chosen, to the
+    /// slots of `receiver`.
     template <class Receiver>
-    struct EditSlots {
-        void (Receiver::*add)();
-        void (Receiver::*modify)();
-        void (Receiver::*remove)();
-        void (Receiver::*selected)(const char *);
-    };
-
-    /// Adds the three buttons that every list has.
-    template <class Receiver>
-    void addEditButtons(Receiver *receiver, const EditSlots<Receiver> &slotsOf) {
-        connect(addButton("Add..."), &QPushButton::clicked, receiver, slotsOf.add);
-        connect(addButton("Modify..."), &QPushButton::clicked, receiver, slotsOf.modify);
-        connect(addButton("Remove"), &QPushButton::clicked, receiver, slotsOf.remove);
-        connect(box_, &QListBox::selected, receiver, slotsOf.selected);
+    void addEditButtons(Receiver *receiver, void (Receiver::*add)(), void (Receiver::*modify)(),
+                        void (Receiver::*remove)(), void (Receiver::*selected)(const char *)) {
+        connect(addButton("Add..."), &QPushButton::clicked, receiver, add);
+        connect(addButton("Modify..."), &QPushButton::clicked, receiver, modify);
+        connect(addButton("Remove"), &QPushButton::clicked, receiver, remove);
+        connect(box_, &QListBox::selected, receiver, selected);
     }
 
 private:

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <QGroupBox>
-#include <QString>
 #include <QVBoxLayout>
 
 #include <optional>

@@ -26,7 +26,6 @@ public:
                void (Owner::*read)(Record *, Dialog *))
         : owner_{owner}, box_{box}, head_{head}, textOf_{textOf}, read_{read} {}
 
-    /// Appends a row for each record.
     void fill() {
         std::vector<KeptText> texts;
         for (const Record *record = *head_; record != nullptr; record = record->next) {

@@ -35,7 +35,6 @@ public:
     /// The page's layout, for what stands below the groups.
     [[nodiscard]] QVBoxLayout *pageLayout() const { return pageLayout_; }
 
-    /// Stores all rows, in their order.
     void store() const;
 
 private:

@@ -57,7 +57,6 @@ public:
     /// stays as it is and says why.
     void replaceText(const QString &text);
 
-    /// Shows a tip for the field now.
     void showTip(const QString &tip) const;
 
 protected:

@@ -265,7 +265,7 @@ private slots:
 
     /// On a display that is not there; words with "=" are put into the environment. What comes out:
     /// the status, then the standard output, then that of errors, with "..." for what the toolkit
-    /// says. Of a missing display it says one line.
+    /// says.
     void commandLine() {
         QProcess program;
         QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
@@ -280,8 +280,7 @@ private slots:
             const bool isEnded = program.waitForFinished() && program.exitStatus() == 0;
             QString output = program.readAllStandardOutput() + program.readAllStandardError();
             output.prepend(QString::number(program.exitCode()) + (isEnded ? " " : " died "));
-            static const QRegularExpression toolkits{
-                "(?s)(opened\n)[^\n]*(:nowhere\n|nonsense[^\n]*\n.+)"};
+            static const QRegularExpression toolkits{"(?s)(opened\n)[^\n]*(:nowhere|nonsense).+"};
             output.replace(master.c_str(), "MASTER").replace(toolkits, "\\1...");
             return output.toStdString();
         };
