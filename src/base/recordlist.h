@@ -37,9 +37,11 @@ private:
 
     static void addBlock() {
         auto *block = new std::array<Place, 16'384 / sizeof(Place)>;
-        for (auto place = block->rbegin(); place != block->rend(); ++place) {
-            place->next = std::exchange(free_, &*place);
+        free_ = block->data();
+        for (Place &place : *block) {
+            place.next = &place + 1;
         }
+        block->back().next = nullptr;
     }
 
     static inline Place *free_ = nullptr;
