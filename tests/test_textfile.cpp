@@ -1,3 +1,5 @@
+#include "base/productfile.h"
+
 #include "datafiles.h"
 
 #include "base/lines.h"

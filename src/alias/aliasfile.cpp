@@ -2,7 +2,7 @@
 
 #include "base/byteset.h"
 #include "base/lines.h"
-#include "base/textfile.h"
+#include "base/productfile.h"
 #include "config/settings.h"
 
 #include <cctype>

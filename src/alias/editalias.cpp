@@ -9,7 +9,7 @@ namespace {
 KeptText shown(const alias_list_entry &target) { return target.alias; }
 
 alias_list_entry copyOf(const alias_list_entry &target) {
-    return {target.alias, target.type, target.bang};
+    return {.alias = target.alias, .type = target.type, .bang = target.bang};
 }
 
 } // namespace

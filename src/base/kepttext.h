@@ -9,8 +9,7 @@
 /// that is not empty, and parts of one are such again: it cannot dangle.
 ///
 /// The price: the bytes of a text that is replaced or removed stay, too, and so does all of a file
-/// that records hold parts of. They are few beside what is in use: a user typed them, or they are
-/// comments and keys.
+/// that records hold parts of, be it one that was loaded and cancelled.
 class KeptText {
 public:
     constexpr KeptText() = default;

@@ -12,21 +12,23 @@ template <class Record>
 class RecordPool {
 public:
     static Record *make(Record value) {
-#ifdef __SANITIZE_ADDRESS__
+#ifdef TARVEX_SANITIZE
         return new Record{std::move(value)}; // It sees a use after free of what is deleted only.
-#endif
+#else
         if (free_ == nullptr) {
             addBlock();
         }
         return new (std::exchange(free_, free_->next)) Record{std::move(value)};
+#endif
     }
 
     static void free(Record *record) {
-#ifdef __SANITIZE_ADDRESS__
-        return delete record;
-#endif
+#ifdef TARVEX_SANITIZE
+        delete record;
+#else
         record->~Record();
         free_ = new (record) Place{free_};
+#endif
     }
 
 private:

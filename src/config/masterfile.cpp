@@ -2,6 +2,7 @@
 
 #include "base/byteset.h"
 #include "base/lines.h"
+#include "base/productfile.h"
 #include "base/textfile.h"
 #include "config/productpaths.h"
 #include "config/settings.h"

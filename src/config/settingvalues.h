@@ -30,7 +30,7 @@ std::optional<std::string> timeSetting(std::int32_t &field, TextOrNone text);
 std::optional<std::string> accessListSetting(std::optional<AccessList> &field, TextOrNone text);
 
 /// -1, 0 or 1, as the strings compare once the C library has lower-cased every byte; -1 when either
-/// is null. The process's locale decides what is a letter.
+/// is null. The thread's locale decides what is a letter.
 int compareNoCase(const char *a, const char *b);
 
 std::string formatUnsigned(std::uint32_t value);

@@ -3,7 +3,6 @@
 #include "config/settings.h"
 #include "fetch/editfetch.h"
 #include "platform/knumericspinbox.h"
-#include "widgets/numberfield.h"
 #include "widgets/pagelayout.h"
 
 #include <QLabel>

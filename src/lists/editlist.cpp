@@ -1,8 +1,7 @@
 #include "lists/editlist.h"
 
 #include "platform/knumericspinbox.h"
-#include "platform/lowscreen.h"
-#include "widgets/numberfield.h"
+#include "platform/screensize.h"
 #include "widgets/textfield.h"
 
 #include <QCheckBox>

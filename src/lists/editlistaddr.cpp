@@ -1,6 +1,6 @@
 #include "lists/editlistaddr.h"
 
-#include "lists/listdialog.h"
+#include "lists/listdialogsizes.h"
 #include "lists/maillistfile.h"
 #include "widgets/textfield.h"
 

@@ -1,6 +1,6 @@
 #include "lists/editlistmember.h"
 
-#include "lists/listdialog.h"
+#include "lists/listdialogsizes.h"
 #include "lists/maillistfile.h"
 #include "widgets/minimumsize.h"
 #include "widgets/textfield.h"

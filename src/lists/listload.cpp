@@ -1,6 +1,6 @@
 #include "lists/listload.h"
 
-#include "lists/listdialog.h"
+#include "lists/listdialogsizes.h"
 #include "widgets/textfield.h"
 
 #include <QHBoxLayout>

@@ -1,6 +1,6 @@
 #include "lists/listsearch.h"
 
-#include "lists/listdialog.h"
+#include "lists/listdialogsizes.h"
 #include "platform/qlistbox.h"
 #include "widgets/textfield.h"
 

@@ -1,7 +1,7 @@
 #include "lists/maillistfile.h"
 
 #include "base/lines.h"
-#include "base/textfile.h"
+#include "base/productfile.h"
 #include "config/settings.h"
 #include "config/settingvalues.h"
 

@@ -1,6 +1,6 @@
 #include "platform/helpwindow.h"
 
-#include "platform/lowscreen.h"
+#include "platform/screensize.h"
 
 #include <QCoreApplication>
 #include <QFileInfo>

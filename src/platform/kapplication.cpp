@@ -1,8 +1,8 @@
 #include "platform/kapplication.h"
 
-#include "platform/charactertable.h"
 #include "platform/displayproblems.h"
 #include "platform/droppedinput.h"
+#include "platform/keyletters.h"
 #include "platform/toolkittexts.h"
 
 #include <QApplication>
@@ -38,7 +38,7 @@ KApplication::KApplication(const char *program, const char *name, bool hasDispla
     } else {
         toolkit_ = std::make_unique<QCoreApplication>(toolkitArgumentCount_, toolkitArguments_);
     }
-    useCharacterTableForKeys();
+    usePlainLettersForKeys();
     QCoreApplication::setApplicationName(name);
     getLocale()->open(name, shared(QStringLiteral("locale")));
     if (hasDisplay) {

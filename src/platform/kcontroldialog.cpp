@@ -3,7 +3,7 @@
 #include "platform/droppedinput.h"
 #include "platform/helpwindow.h"
 #include "platform/kconfigwidget.h"
-#include "platform/lowscreen.h"
+#include "platform/screensize.h"
 
 #include <QApplication>
 #include <QHBoxLayout>

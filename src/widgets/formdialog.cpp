@@ -1,7 +1,7 @@
 #include "widgets/formdialog.h"
 
 #include "platform/kcontroldialog.h"
-#include "platform/lowscreen.h"
+#include "platform/screensize.h"
 #include "widgets/minimumsize.h"
 #include "widgets/textfield.h"
 

@@ -1,5 +1,6 @@
 #include "widgets/pagelayout.h"
 
+#include "platform/knumericspinbox.h"
 #include "widgets/minimumsize.h"
 
 #include <QWidget>
@@ -29,4 +30,14 @@ void addOfHeight(QBoxLayout *layout, QWidget *widget, int height, std::optional<
         widget->setParent(parent);
     }
     layout->addItem(new ShrinkingItem(widget, full));
+}
+
+KNumericSpinBox *newNumberField(QWidget *parent, int minimum, int maximum, int value) {
+    auto *field = new KNumericSpinBox(parent);
+    field->setRange(minimum, maximum);
+    field->setStep(1);
+    field->setEditable(true);
+    field->setValue(value);
+    field->setFixedWidth(minimumSizeFor(field, {numberWidth, 0}).width());
+    return field;
 }

@@ -5,10 +5,13 @@
 
 #include <optional>
 
+class KNumericSpinBox;
+
 /// The measures, in pixels, that all pages share.
 constexpr int pageBorder = 10;
 constexpr int groupSpacing = 5;
 constexpr int spaceAboveFirstRow = 10;
+constexpr int numberWidth = 60;
 
 /// Whether borders, spacings and rows grow lower where the window is too low for all of them, each
 /// by its share of what is missing.
@@ -25,6 +28,10 @@ inline void addSpace(QVBoxLayout *layout, int height, Shrinking shrinking) {
 /// many pixels more than its font's height.
 void addOfHeight(QBoxLayout *layout, QWidget *widget, int height,
                  std::optional<int> padding = std::nullopt);
+
+/// A field for a whole number from `minimum` to `maximum`, to be typed or stepped by 1. It begins
+/// with the stored `value`, be that inside the range or not.
+KNumericSpinBox *newNumberField(QWidget *parent, int minimum, int maximum, int value);
 
 inline QVBoxLayout *newPageLayout(QWidget *page) {
     auto *layout = new QVBoxLayout(page);

@@ -1,7 +1,6 @@
 #include "widgets/settingsform.h"
 
 #include "platform/knumericspinbox.h"
-#include "widgets/numberfield.h"
 #include "widgets/pagelayout.h"
 #include "widgets/textfield.h"
 

@@ -21,10 +21,10 @@ struct FieldRule {
 /// A rule for a text of at most `maximumBytes`, and nothing else.
 FieldRule lengthRule(std::size_t maximumBytes);
 
-/// A line edit for bytes: the only way into a record or a setting. What the user types or pastes
-/// against its rule it refuses, and says why beside its window: a tool tip below the field would
-/// cover the next one and take its click. Without a rule it refuses only what would take its text
-/// beyond `maximumBytes`, whole; it cuts nothing.
+/// A line edit for bytes: the only way of a text into a record or a setting. What the user types or
+/// pastes against its rule it refuses, and says why beside its window: a tool tip below the field
+/// would cover the next one and take its click. Without a rule it refuses only what would take its
+/// text beyond `maximumBytes`, whole; it cuts nothing.
 class TextField : public QLineEdit {
     Q_OBJECT
 

@@ -1,11 +1,11 @@
-#include "platform/charactertable.h"
+#include "platform/keyletters.h"
 
 #include <algorithm>
 #include <cctype>
 #include <clocale>
 #include <string_view>
 
-void useCharacterTableForKeys() {
+void usePlainLettersForKeys() {
     const auto isLowered = [](char letter) { return std::tolower(letter) == letter - 'A' + 'a'; };
     const std::string_view letters = "ABCDEFGHIJKLMNOPQRSTUVWXYZ";
     if (std::ranges::all_of(letters, isLowered)) {

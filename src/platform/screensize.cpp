@@ -1,4 +1,4 @@
-#include "platform/lowscreen.h"
+#include "platform/screensize.h"
 
 #include <QApplication>
 #include <QScreen>
