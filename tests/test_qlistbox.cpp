@@ -16,6 +16,7 @@ struct Window : QObject {
                     const std::vector<std::string_view> &rows = {"a", "b", "c", "d", "e"}) {
         box->resize(200, 300);
         std::vector<KeptText> texts;
+        texts.reserve(rows.size());
         for (const std::string_view row : rows) {
             texts.push_back(keep(std::string{row}));
         }

@@ -47,7 +47,6 @@ struct Option {
     std::uint32_t bit;
 };
 
-/// In the order of the window, which is not that of the bits.
 constexpr std::array<Option, 5> options{
     {{"Allow posting from any address (open list)", MAILLIST_OPEN},
      {"Allow posting by members", MAILLIST_MEMBERS_POST},
@@ -217,11 +216,12 @@ QGroupBox *EditList::newOptions(const maillist_entry &list) {
 }
 
 void EditList::store(maillist_entry &list) {
-    maillist_fields fields = list;
+    maillist_fields &record = list;
+    maillist_fields fields = record;
     for (const auto &storeWidget : stores_) {
         storeWidget(fields);
     }
-    static_cast<maillist_fields &>(list) = fields;
+    record = fields;
     for (std::size_t index = 0; index < addressKinds.size(); ++index) {
         list.*addressKinds.at(index).chain = groups_.at(index)->takeChain();
     }

@@ -82,9 +82,9 @@ public:
 private:
     static KeptText keptRow(KeptText text) { return text; }
     static KeptText keptRow(std::string_view text) { return keep(std::string{text}); }
-    KeptText rowOf(const Record &record) const { return keptRow(textOf_(record)); }
+    [[nodiscard]] KeptText rowOf(const Record &record) const { return keptRow(textOf_(record)); }
 
-    Record **linkToShown(std::string_view text) const {
+    [[nodiscard]] Record **linkToShown(std::string_view text) const {
         return findRecord(head_, [&](const Record &record) { return textOf_(record) == text; });
     }
 
