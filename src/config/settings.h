@@ -43,7 +43,7 @@ enum class Scale : int {};
 /// A setting whose handler needs nothing but its value.
 template <class Value, std::optional<std::string> (*handler)(Value &, TextOrNone)>
 struct HandledSetting : Setting {
-    HandledSetting(SettingTable &table, const char *key, Value standard = {})
+    HandledSetting(SettingTable &table, const char *key, const Value &standard = {})
         : Setting{table, key}, value{standard} {}
     std::optional<std::string> exchange(TextOrNone text) override { return handler(value, text); }
     Value value;

@@ -7,7 +7,6 @@ class KConfigWidget : public QWidget {
     Q_OBJECT
 
 public:
-    /// `name` becomes the object name.
     KConfigWidget(QWidget *parent, const char *name) : QWidget(parent) { setObjectName(name); }
 
     /// Does nothing: a page's constructor fills its widgets.

@@ -71,11 +71,12 @@ public:
 
     /// Removes the current row and the record that it leads to, if there are both.
     void removeCurrent() {
-        const std::optional<int> row = box_->currentRow();
-        Record **link = row ? linkToShown(box_->text(*row)) : nullptr;
-        if (link != nullptr && *link != nullptr) {
-            box_->remove(*row);
-            removeRecord(link);
+        if (const std::optional<int> row = box_->currentRow()) {
+            Record **link = linkToShown(box_->text(*row));
+            if (*link != nullptr) {
+                box_->remove(*row);
+                removeRecord(link);
+            }
         }
     }
 
