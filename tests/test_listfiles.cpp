@@ -47,12 +47,6 @@ std::string rewrittenFetchers(const std::string &bytes) {
     return formatPopHosts();
 }
 
-/// Reading turns these lists round.
-template <auto rewrite>
-std::string rewrittenTwice(const std::string &bytes) {
-    return rewrite(rewrite(bytes));
-}
-
 constexpr auto rewrittenRejects = rewritten<parseSmtpRejects, smtpreject_list, formatSmtpRejects>;
 constexpr auto rewrittenLists = rewritten<parseMailLists, maillist_list, formatMailLists>;
 
@@ -64,19 +58,6 @@ std::string block(const std::string &name, const std::string &flags, const std::
            "%flags:" +
            flags + "\n#start member\n" + members +
            "#end\n#start allow\n\n#end\n#start block\nc d\n#end\n#endlist\n\n\n";
-}
-
-/// Up to `maximum` times what `make` returns, in a hundred rounds: `rewrite` gives it back.
-template <class Make, class Rewrite>
-void checkRandomLists(unsigned maximum, Make make, Rewrite rewrite) {
-    std::mt19937 random{1};
-    for (int round = 0; round < 100; ++round) {
-        std::string bytes;
-        for (auto count = random() % (maximum + 1); count > 0; --count) {
-            bytes += make(random);
-        }
-        QCOMPARE(rewrite(bytes), bytes);
-    }
 }
 
 } // namespace
@@ -129,44 +110,6 @@ private slots:
                 return text;
             },
             "[loaded lines]");
-    }
-
-    void randomListsComeBack() {
-        checkRandomLists(
-            1,
-            [](std::mt19937 &random) {
-                constexpr std::array starts{",", ",[", ",#", ",!", ",!#", ",![", ",$@", ",y\n"};
-                std::string bytes = "x";
-                for (auto count = random() % 99; count > 0; --count) {
-                    bytes += starts.at(random() % 8) + ('x' + randomText(random, " \t,\r\n", 300));
-                }
-                return bytes + ",y\n";
-            },
-            rewritten<parseAliases, alias_list, formatAliases>);
-        checkRandomLists(
-            20,
-            [](std::mt19937 &random) {
-                return 'a' + randomText(random, " \t\n\r\v\f", 248) + '\n';
-            },
-            rewrittenTwice<rewrittenRejects>);
-        checkRandomLists(
-            3,
-            [](std::mt19937 &random) {
-                std::string members;
-                for (auto left = random() % 6; left > 0; --left) {
-                    members += randomText(random, "#\r\n", 248) + '\n';
-                }
-                return block(randomText(random, "\r\n", 240), std::to_string(random()), members);
-            },
-            rewrittenTwice<rewrittenLists>);
-        checkRandomLists(
-            100, // Far more than 4095 bytes.
-            [](std::mt19937 &random) {
-                return (random() % 2 == 0 ? "*x" : "-*x") + randomText(random, ":@,\r\n", 30) +
-                       ':' + randomText(random, ":@,\r\n", 31) + '@' +
-                       randomText(random, ":@,\r\n", 62) + '\n';
-            },
-            rewrittenFetchers);
     }
 
     /// Read twice and written; then at paths at which no file can be read or written. Aliases are

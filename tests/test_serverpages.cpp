@@ -72,7 +72,7 @@ private slots:
             auto values = allValues();
             const auto page = make();
             page->storeValues();
-            QVERIFY(allValues() == values);
+            QVERIFY2(allValues() == values, key.c_str());
             page->show();
             if (typed == nullptr) {
                 press(page.get(), caption);

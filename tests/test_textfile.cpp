@@ -33,6 +33,8 @@ struct Fault {
     rlim_t longestFile = RLIM_INFINITY;
 } present;
 
+std::string done; ///< "w" for each write, "s" for each time that a file is put on the disk.
+
 /// The pieces, each with a semicolon behind it.
 std::string cut(std::string_view bytes, std::size_t longest) {
     std::string text;
@@ -45,7 +47,7 @@ std::string cut(std::string_view bytes, std::size_t longest) {
 
 } // namespace
 
-// Of these three the program finds the test's rather than the C library's.
+// Of these the program finds the test's rather than the C library's.
 
 int fallocate(int fd, int mode, off_t offset, off_t len) {
     const int error = present.fallocateError;
@@ -69,7 +71,13 @@ ssize_t write(int fd, const void *buf, std::size_t n) {
         return -1;
     }
     present.writesLeft -= present.writesLeft > 0 ? 1 : 0;
+    done += 'w';
     return syscall(SYS_write, fd, buf, std::min(n, writtenAtOnce));
+}
+
+int fdatasync(int /*fildes*/) {
+    done += 's';
+    return 0;
 }
 
 class TestTextFile : public QObject {
@@ -94,6 +102,12 @@ private slots:
         }
         // Says that it is empty, but is not.
         QVERIFY(bytesAt("/proc/self/status").starts_with("Name:"));
+    }
+
+    void aFileIsOnTheDiskBeforeTheNextIsTouched() {
+        done.clear();
+        QVERIFY(rewriteFile(file, "a") && rewriteFile(file, "b"));
+        QCOMPARE(done, "wsws");
     }
 
     void whatIsNoFileIsNeitherReadNorWritten() {
@@ -216,17 +230,17 @@ private slots:
             if (*bytes != '\0') {
                 rewriteFile(path, bytes);
             }
-            QCOMPARE(product.read(path, take), result);
+            QVERIFY2(product.read(path, take) == result, bytes);
             product.rewrite(path, format);
-            QVERIFY(bytesAt(path) == expected);
+            QVERIFY2(bytesAt(path) == expected, bytes);
         }
         const auto formatMuch = [](std::string & /*bytes*/) { throw std::bad_alloc{}; };
         product.rewrite(folder + "/none", formatMuch);
         QVERIFY(bytesAt(folder + "/none") == "new");
         for (const std::string &path : {broken, loop, folder}) {
-            QCOMPARE(product.read(path, take), 1);
+            QVERIFY2(product.read(path, take) == 1, path.c_str());
             product.rewrite(file, format);
-            QVERIFY(bytesAt(file) == "much");
+            QVERIFY2(bytesAt(file) == "much", path.c_str());
         }
     }
 

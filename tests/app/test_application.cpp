@@ -7,14 +7,11 @@
 #include "platform/kconfigwidget.h"
 #include "server/smtprejectfile.h"
 
-#include <QProcess>
-#include <QRegularExpression>
 #include <QScrollArea>
 #include <QSpinBox>
 #include <QTabWidget>
 #include <QTextBrowser>
 
-#include <clocale>
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -51,19 +48,11 @@ class TestApplication : public QObject {
     Q_OBJECT
 
 private slots:
-    void startsWithAllTabs() {
-        QStringList labels;
-        for (int tab = 0; tab < tabs()->count(); ++tab) {
-            labels << tabs()->tabText(tab) + '=' + tabs()->widget(tab)->objectName();
-        }
-        QCOMPARE(labels.join(' '), "&SMTP=smtpserver &POP3=pop3server &IMAP=imapserver "
-                                   "Fetchers=fetch &Delivery=debatch &Aliasing=alias "
-                                   "&Mail List=list");
+    void startsReady() {
         QVERIFY(QTest::qWaitForWindowActive(mainDialog()));
         QCOMPARE(mainDialog()->windowTitle(), "Tarvex Mail Config");
         QVERIFY(
             captioned(mainDialog(), &QAbstractButton::text, "OK")->property("default").toBool());
-        QVERIFY(mainDialog()->findChildren<QLabel *>(Qt::FindDirectChildrenOnly).isEmpty());
         QVERIFY(!fs::exists(runs) && anywhere<QScrollArea>() == nullptr);
     }
 
@@ -153,14 +142,14 @@ private slots:
             QKeyEvent again{QEvent::KeyPress, key, {}, {}, isMarked};
             release.setTimestamp(5);
             again.setTimestamp(isMarked ? 6 : 5);
-            QVERIFY(!withDialog(
-                [&] {
-                    QApplication::sendEvent(add, &release);
-                    QApplication::sendEvent(add, &again);
-                    QApplication::sendEvent(add, &release);
-                },
-                [](QWidget *dialog) { dialog->close(); }));
-            QVERIFY(mainDialog()->isVisible());
+            const auto send = [&] {
+                QApplication::sendEvent(add, &release);
+                QApplication::sendEvent(add, &again);
+                QApplication::sendEvent(add, &release);
+            };
+            const bool isOpened = withDialog(send, [](QWidget *dialog) { dialog->close(); });
+            QVERIFY2(!isOpened && mainDialog()->isVisible(),
+                     qPrintable(QKeySequence{key}.toString() + (isMarked ? " marked" : "")));
         }
         QVERIFY(withDialog([&] { QTest::keyClick(add, Qt::Key_Return); },
                            [](QWidget *dialog) { dialog->close(); }));
@@ -169,7 +158,6 @@ private slots:
     }
 
     void captionsLettersReachTheirFields() {
-        QStringList pressed;
         for (int tab = 0; tab < tabs()->count(); ++tab) {
             tabs()->setCurrentIndex(tab);
             for (const QLabel *label : tabs()->widget(tab)->findChildren<QLabel *>()) {
@@ -180,11 +168,9 @@ private slots:
                     QTest::keySequence(mainDialog(), letter);
                     QCOMPARE(tabs()->currentIndex(), tab);
                     QVERIFY2(label->buddy()->hasFocus(), qPrintable(label->text()));
-                    pressed << letter.toString();
                 }
             }
         }
-        QCOMPARE(pressed.size(), 2 * (6 + 5 + 5 + 7));
         QTest::keyClick(mainDialog(), Qt::Key_S, Qt::AltModifier);
         QCOMPARE(tabs()->currentIndex(), 0);
     }
@@ -215,7 +201,7 @@ private slots:
                                           {"../en/tarvex-mail-imap.html/", "SMTP"},
                                           {"nothing.html", "SMTP"}}) {
             help()->anchorClicked(help()->source().resolved(QUrl{link}));
-            QCOMPARE(help()->window()->windowTitle(), title);
+            QVERIFY2(help()->window()->windowTitle() == title, link);
         }
         QCOMPARE(help()->source().fragment(), "access");
     }
@@ -244,48 +230,18 @@ private slots:
 
     void onlyOkApplies() {
         fs::remove(runs);
-        for (const auto &close : {+[] { press(mainDialog(), "Cancel"); },
-                                  +[] { QTest::keyClick(mainDialog(), Qt::Key_Escape); },
-                                  +[] { press(mainDialog(), "OK"); }}) {
-            QVERIFY(!fs::exists(runs));
+        for (const auto &[name, close] :
+             {std::pair{"Cancel", +[] { press(mainDialog(), "Cancel"); }},
+              {"Esc", +[] { QTest::keyClick(mainDialog(), Qt::Key_Escape); }},
+              {"OK", +[] { press(mainDialog(), "OK"); }}}) {
+            QVERIFY2(!fs::exists(runs), name);
             mainDialog()->show();
             help()->window()->show(); // Left open, it does not keep the program alive.
             QTimer::singleShot(0, close);
             QCoreApplication::exec();
-            QVERIFY(!mainDialog()->isVisible());
+            QVERIFY2(!mainDialog()->isVisible(), name);
         }
         QVERIFY(fs::exists(runs));
-    }
-
-    void captionsAreTranslated() {
-        QVERIFY(std::setlocale(LC_MESSAGES, "de_DE.UTF-8") != nullptr);
-        QCOMPARE(KApplication::getLocale()->translate("&Password:"), "&Kennwort:");
-        std::setlocale(LC_MESSAGES, "");
-    }
-
-    /// On a display that is not there; words with "=" are put into the environment. What comes out:
-    /// the status, then the standard output, then that of errors, with "..." for what the toolkit
-    /// says.
-    void commandLine() {
-        QProcess program;
-        QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
-        environment.insert("QT_QPA_PLATFORM", "xcb");
-        environment.insert("DISPLAY", ":nowhere");
-        program.setProcessEnvironment(environment);
-        fs::remove(master);
-        const auto outputOf = [&](const std::string &arguments) {
-            QStringList words = QString::fromStdString(arguments).split(' ', Qt::SkipEmptyParts);
-            words.insert(words.filter("=").size(), TEST_PROGRAM);
-            program.start("env", words);
-            const bool isEnded = program.waitForFinished() && program.exitStatus() == 0;
-            QString output = program.readAllStandardOutput() + program.readAllStandardError();
-            output.prepend(QString::number(program.exitCode()) + (isEnded ? " " : " died "));
-            static const QRegularExpression toolkits{"(?s)(opened\n)[^\n]*(:nowhere|nonsense).+"};
-            output.replace(master.c_str(), "MASTER").replace(toolkits, "\\1...");
-            return output.toStdString();
-        };
-        checkRows(outputOf, "[command line]");
-        QVERIFY(!fs::exists(master));
     }
 };
 

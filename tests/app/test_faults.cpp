@@ -1,4 +1,5 @@
 #include "datafiles.h"
+#include "program.h"
 
 #include "alias/aliasfile.h"
 #include "config/masterfile.h"
@@ -6,19 +7,14 @@
 #include "lists/maillistfile.h"
 #include "server/smtprejectfile.h"
 
-#include <QProcess>
 #include <QRegularExpression>
 
 #include <csignal>
 #include <fcntl.h>
-#include <linux/capability.h>
 #include <malloc.h>
-#include <poll.h>
 #include <sched.h>
 #include <set>
-#include <sys/prctl.h>
 #include <sys/resource.h>
-#include <sys/socket.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
 
@@ -34,11 +30,6 @@ constexpr bool withSanitizer = true;
 #else
 constexpr bool withSanitizer = false;
 #endif
-
-/// Whether the lines, run in the product's folder, end with 0.
-bool shell(const std::string &lines) {
-    return std::system(("exec 2>/dev/null\n" + lines).c_str()) == 0;
-}
 
 /// Folders of old files, of what an apply makes of them, and of what it makes of nothing.
 void makeProduct(int lines) {
@@ -82,56 +73,6 @@ std::string state() {
     }
     return digits + (bytesAt("config/ran") == "ran\n" ? "ran" : "");
 }
-
-/// The real program, with its buttons pressed from here.
-struct Program : QProcess {
-    explicit Program(
-        const QStringList &arguments = {}, const std::function<void()> &prepare = [] {}) {
-        int ends[2];
-        socketpair(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0, ends);
-        setProcessChannelMode(ForwardedErrorChannel);
-        setStandardOutputFile(nullDevice());
-        setChildProcessModifier([&] {
-            setpgid(0, 0);
-            prctl(PR_SET_PDEATHSIG, SIGKILL);
-            close_range(3, ~0U, CLOSE_RANGE_CLOEXEC);
-            dup2(ends[1], DRIVER_LINE);
-            prepare();
-        });
-        start(TEST_PROGRAM, arguments);
-        number = static_cast<pid_t>(processId());
-        line = ends[0];
-        ::close(ends[1]);
-    }
-    ~Program() override {
-        if (number > 0) {
-            ::kill(-number, SIGKILL); // And whatever it has started.
-        }
-        waitForFinished();
-        ::close(line);
-    }
-    static constexpr int hangs = 999; ///< In place of a status.
-    /// The next letter that it says; "-" once it is gone, "?" when it hangs.
-    [[nodiscard]] char heard(int patience = 60'000) const {
-        char letter = '-';
-        pollfd end{line, POLLIN, 0};
-        return poll(&end, 1, patience) == 1 ? (recv(line, &letter, 1, 0), letter) : '?';
-    }
-    [[nodiscard]] bool isReady() const { return heard() == 'h' && heard() == 'r'; }
-    void press(char letter) const { send(line, &letter, 1, MSG_NOSIGNAL); }
-    [[nodiscard]] bool applies() const { return press('A'), heard() == 'A'; }
-    /// The exit status, or the signal that ended it as a negative number.
-    int end() {
-        const bool isEnded = waitForFinished(60'000);
-        return isEnded ? exitCode() * (exitStatus() == CrashExit ? -1 : 1) : hangs;
-    }
-    void limitFileSize(rlim_t longest) const {
-        const rlimit limit{.rlim_cur = longest, .rlim_max = RLIM_INFINITY};
-        prlimit(number, RLIMIT_FSIZE, &limit, nullptr);
-    }
-    int line;
-    pid_t number;
-};
 
 /// Reads and writes all files in a process of its own that gets so much memory more while it reads,
 /// or else while it writes. Its status.
@@ -442,16 +383,10 @@ private slots:
 };
 
 int main(int argc, char **argv) {
-    umask(022);
-    mallopt(M_ARENA_MAX, 1); // Another thread's heap would hold memory that no limit counts.
-    shell("chattr -R -a '" TEST_PRODUCT "'; rm -rf '" TEST_PRODUCT "'; mkdir -p '" TEST_PRODUCT
-          "/disk'");
-    if (chdir(TEST_PRODUCT) != 0) {
+    if (!enterProduct()) {
         return 1;
     }
-    // What is started has no rights to files beyond those of their modes, as most users.
-    prctl(PR_CAPBSET_DROP, CAP_DAC_OVERRIDE);
-    prctl(PR_CAPBSET_DROP, CAP_DAC_READ_SEARCH);
+    mallopt(M_ARENA_MAX, 1); // Another thread's heap would hold memory that no limit counts.
     // The mount is gone with the test's own view of the file system.
     if (unshare(CLONE_NEWNS) == 0) {
         shell("mount --make-rprivate / && mount -t tmpfs -o size=64k tmpfs disk");
