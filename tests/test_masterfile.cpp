@@ -48,18 +48,6 @@ private slots:
         checkRows(filled, "[writing the master file]");
     }
 
-    void randomTextsSurviveWritingAndReading() {
-        std::mt19937 random{1};
-        for (int round = 0; round < 500; ++round) {
-            const std::string text = randomText(random, ",\r\n \t", 300) + "x,|,%:,#";
-            settings().admin_email.value = text;
-            const std::string bytes = filled("%smtp.hosts:\n%admin.email:");
-            settings().admin_email.value.reset();
-            parseMasterConfig(bytes);
-            QCOMPARE(settings().admin_email.value.value_or("none"), text);
-        }
-    }
-
     void noiseAndALineOf100MegabytesHideNothing() {
         std::mt19937 random{1};
         std::string bytes = randomText(random, "", 200'000) + "\n%admin.email:";
@@ -68,27 +56,6 @@ private slots:
         QCOMPARE(readMasterConfig(), 0);
         QCOMPARE(settings().admin_email.value.value_or("").size(), 100'000'000U);
         QCOMPARE(settings().smtp_sock_port.value, 2525);
-    }
-
-    void theTemplateReplacesTheMasterFile() {
-        settings().smtp_sock_port.value = 2525;
-        for (const char *lines : {"%smtp.sock.port:\n", "", "\n%smtp.sock.port:1\n"}) {
-            rewriteFile(masterTemplate, lines);
-            writeMasterConfig(); // The first time there is no master file.
-            QVERIFY(bytesAt(master) == (*lines == '\0' ? "" : portLine));
-        }
-        remove(masterTemplate);
-        writeMasterConfig();
-        QVERIFY(bytesAt(master) == portLine);
-    }
-
-    void aMasterFileThatIsNoFileIsPassedOver() {
-        QCOMPARE(readMasterConfig(), 1);
-        rewriteFile(masterTemplate, portLine);
-        create_directory(master);
-        writeMasterConfig();
-        QCOMPARE(readMasterConfig(), 1);
-        QCOMPARE(settings().smtp_sock_port.value, 25);
     }
 };
 

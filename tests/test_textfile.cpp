@@ -128,18 +128,6 @@ private slots:
         QVERIFY(!mayRewrite(folder + "/no/new") && !mayRewrite(file + "/new") && !mayRewrite(""));
     }
 
-    void linksAndModeStay() {
-        const std::string link = folder + "/link";
-        QVERIFY(rewriteFile(file, "a longer text") && chmod(file.c_str(), 0640) == 0);
-        QCOMPARE(symlink("file", link.c_str()), 0);
-        struct stat before = {};
-        QCOMPARE(stat(file.c_str(), &before), 0);
-        QVERIFY(rewriteFile(link, "short") && bytesAt(file) == "short");
-        struct stat after = {};
-        QCOMPARE(stat(file.c_str(), &after), 0);
-        QVERIFY(after.st_ino == before.st_ino && after.st_mode == before.st_mode);
-    }
-
     /// A file server that holds a lease on a file gives it up when asked.
     void aLeaseIsWaitedFor() {
         for (const bool isRead : {true, false}) {

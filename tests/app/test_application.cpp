@@ -95,22 +95,6 @@ private slots:
         QVERIFY(written.ends_with("\n%not.known: 0\nran\n"));
     }
 
-    void failedWritesStopNothing() {
-        layProduct();
-        fs::remove(aliases);
-        fs::create_directory(aliases);
-        fs::remove(rejects);
-        fs::create_symlink("/dev/full", rejects);
-        settingByKey("mail.file.alias", aliases.string());
-        settingByKey("mail.file.smtpreject", rejects.string());
-        settings().mail_file_maillist.value.reset();
-        press(mainDialog(), "Apply");
-        QVERIFY(fs::is_directory(aliases) && fs::exists(runs) && mainDialog()->isVisible());
-        QVERIFY(read(master).starts_with("| template\n"));
-        QCOMPARE(whole(formatAliases, alias_list) + whole(formatSmtpRejects, smtpreject_list),
-                 given("applied/alias") + given("applied/reject"));
-    }
-
     void whatArrivesDuringAnApplyIsDropped() {
         layProduct();
         auto *apply = captioned(mainDialog(), &QAbstractButton::text, "Apply");
