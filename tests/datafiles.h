@@ -66,11 +66,3 @@ inline void layProduct() {
         std::abort();
     }
 }
-
-/// Up to `longest` random bytes, high ones among them; no NUL and none of `excluded`.
-inline std::string randomText(std::mt19937 &random, std::string_view excluded, size_t longest) {
-    std::string text(random() % (longest + 1), 'x');
-    std::ranges::generate(text, [&] { return static_cast<char>(1 + random() % 255); });
-    std::erase_if(text, [&](char byte) { return excluded.find(byte) != excluded.npos; });
-    return text;
-}

@@ -124,39 +124,6 @@ private slots:
         QVERIFY(window.box->horizontalScrollBar()->maximum() == 0);
     }
 
-    void mouse() {
-        const QPoint below{20, 290};
-        const Window window{1};
-        QWidget *viewport = window.box->viewport();
-        for (const Qt::KeyboardModifier modifier : {Qt::NoModifier, Qt::ControlModifier}) {
-            QTest::mouseClick(viewport, Qt::LeftButton, modifier, centreOfRow(window.box, 3));
-            QCOMPARE(window.current(), "3");
-            QTest::mouseClick(viewport, Qt::LeftButton, modifier, below);
-            QCOMPARE(window.current(), "3");
-            QTest::mousePress(viewport, Qt::LeftButton, modifier, centreOfRow(window.box, 0));
-            const QPointF to = centreOfRow(window.box, 2);
-            QMouseEvent move{QEvent::MouseMove, to,      viewport->mapToGlobal(to), Qt::NoButton,
-                             Qt::LeftButton,    modifier};
-            QApplication::sendEvent(viewport, &move);
-            QTest::mouseRelease(viewport, Qt::LeftButton, modifier, to.toPoint());
-            QCOMPARE(window.current(), "2");
-        }
-    }
-
-    void keys() {
-        using Case = std::tuple<const char *, int, Qt::Key, Qt::KeyboardModifier, const char *>;
-        for (const auto &[name, from, key, modifier, current] : std::initializer_list<Case>{
-                 {"Ctrl+A, no row", -1, Qt::Key_A, Qt::ControlModifier, "-1"},
-                 {"Ctrl+C, no row", -1, Qt::Key_C, Qt::ControlModifier, "-1"},
-                 {"Ctrl+Down", 1, Qt::Key_Down, Qt::ControlModifier, "2"},
-                 {"Shift+Down", 1, Qt::Key_Down, Qt::ShiftModifier, "2"},
-                 {"Ctrl+Space", 1, Qt::Key_Space, Qt::ControlModifier, "1"}}) {
-            const Window window{from};
-            QTest::keyClick(window.box, key, modifier);
-            QVERIFY2(window.current() == current, name);
-        }
-    }
-
     void removal() {
         using Case = std::tuple<int, int, const char *, const char *>;
         for (const auto &[from, removed, current, left] :

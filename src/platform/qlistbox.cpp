@@ -120,13 +120,7 @@ void QListBox::append(const std::vector<KeptText> &texts) { rows_->append(texts)
 
 void QListBox::changeText(int row, KeptText text) { rows_->change(row, text); }
 
-void QListBox::remove(int row) {
-    const bool wasCurrent = currentRow() == row;
-    rows_->remove(row);
-    if (wasCurrent && count() > 0) {
-        setCurrentRow(std::min(row, count() - 1));
-    }
-}
+void QListBox::remove(int row) { rows_->remove(row); }
 
 std::optional<int> QListBox::currentRow() const {
     const QModelIndex current = currentIndex();

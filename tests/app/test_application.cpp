@@ -12,10 +12,6 @@
 #include <QTabWidget>
 #include <QTextBrowser>
 
-#include <fcntl.h>
-#include <sys/stat.h>
-#include <unistd.h>
-
 namespace fs = std::filesystem;
 
 namespace {
@@ -48,14 +44,6 @@ class TestApplication : public QObject {
     Q_OBJECT
 
 private slots:
-    void startsReady() {
-        QVERIFY(QTest::qWaitForWindowActive(mainDialog()));
-        QCOMPARE(mainDialog()->windowTitle(), "Tarvex Mail Config");
-        QVERIFY(
-            captioned(mainDialog(), &QAbstractButton::text, "OK")->property("default").toBool());
-        QVERIFY(!fs::exists(runs) && anywhere<QScrollArea>() == nullptr);
-    }
-
     void applyWithoutEditsKeepsEveryValue() {
         for (const char *ran : {"ran\n", "ran\nran\n"}) {
             press(mainDialog(), "Apply");
@@ -75,24 +63,6 @@ private slots:
         QCOMPARE(read(master), before);
         press(mainDialog(), "Apply");
         QCOMPARE(read(master), given("applied/master.edited"));
-    }
-
-    /// All lead into one pipe; what comes out of it shows the order.
-    void filesAreWrittenInOrderBeforeTheCommandRuns() {
-        fs::remove(master);
-        fs::remove(runs);
-        QCOMPARE(mkfifo(master.c_str(), 0600), 0);
-        fs::create_symlink(master, runs);
-        for (const char *key : {"mail.file.alias", "mail.file.smtpreject", "mail.file.maillist"}) {
-            settingByKey(key, master.string());
-        }
-        std::string written(65536, '\0');
-        const int pipe = open(master.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC);
-        press(mainDialog(), "Apply");
-        written.resize(static_cast<std::size_t>(::read(pipe, written.data(), written.size())));
-        close(pipe);
-        QVERIFY(written.starts_with(expectedFiles + "| template\n"));
-        QVERIFY(written.ends_with("\n%not.known: 0\nran\n"));
     }
 
     void whatArrivesDuringAnApplyIsDropped() {

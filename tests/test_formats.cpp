@@ -1,6 +1,7 @@
 #include "datafiles.h"
 
 #include "alias/aliasfile.h"
+#include "config/masterfile.h"
 #include "config/settings.h"
 #include "fetch/pophosts.h"
 #include "lists/maillistfile.h"
@@ -60,14 +61,19 @@ std::string block(const std::string &name, const std::string &flags, const std::
            "#end\n#start allow\n\n#end\n#start block\nc d\n#end\n#endlist\n\n\n";
 }
 
+std::string filled(const std::string &lines) {
+    std::string bytes;
+    formatMasterConfig(lines, bytes);
+    return bytes;
+}
+
 } // namespace
 
-/// The formats that hold lists of records.
-class TestListFiles : public QObject {
+class TestFormats : public QObject {
     Q_OBJECT
 
 private slots:
-    void reading() {
+    void listsOfRecordsAreRead() {
         checkRows(rewritten<parseAliases, alias_list, showAliases>, "[aliases]");
         checkRows(rewrittenRejects, "[rejects]");
         checkRows(rewritten<parseMailLists, maillist_list, showLists>, "[mail lists]");
@@ -112,6 +118,34 @@ private slots:
             "[loaded lines]");
     }
 
+    void masterFileIsRead() {
+        checkRows(
+            [](const std::string &bytes) {
+                settings().admin_email.value.reset();
+                parseMasterConfig(bytes);
+                return settings().admin_email.value.value_or("none");
+            },
+            "[reading the master file]");
+    }
+
+    void masterFileIsWritten() {
+        settings().admin_email.value = "a, b,,|c";
+        settings().smtp_hosts.value.reset();
+        settings().smtp_direct.value = "";
+        checkRows(filled, "[writing the master file]");
+    }
+
+    void noiseAndALineOf100MegabytesHideNothing() {
+        std::mt19937 random{1};
+        std::string bytes(200'000, '\0');
+        std::ranges::generate(bytes, [&] { return static_cast<char>(random()); });
+        bytes += "\n%admin.email:";
+        bytes.resize(bytes.size() + 100'000'000, ',');
+        parseMasterConfig(bytes + "\n%smtp.sock.port: 2525\n");
+        QCOMPARE(settings().admin_email.value.value_or("").size(), 100'000'000U);
+        QCOMPARE(settings().smtp_sock_port.value, 2525);
+    }
+
     void aliasesAreAddedToWhatIsThere() {
         alias_list.clear();
         for (const char *bytes : {"#a b\nc d ![e]\r\nf,##g\nh ,\ni", "j,k"}) {
@@ -131,5 +165,5 @@ private slots:
     }
 };
 
-QTEST_GUILESS_MAIN(TestListFiles)
-#include "test_listfiles.moc"
+QTEST_GUILESS_MAIN(TestFormats)
+#include "test_formats.moc"
