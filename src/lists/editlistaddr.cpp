@@ -1,7 +1,7 @@
 #include "lists/editlistaddr.h"
 
-#include "lists/listdialogsizes.h"
 #include "lists/maillistfile.h"
+#include "lists/smalldialogsizes.h"
 #include "widgets/textfield.h"
 
 EditListAddr::EditListAddr(QWidget *parent, const char *name, const maillist_addr_entry *entry)

@@ -1,7 +1,7 @@
 #include "lists/editlistmember.h"
 
-#include "lists/listdialogsizes.h"
 #include "lists/maillistfile.h"
+#include "lists/smalldialogsizes.h"
 #include "widgets/minimumsize.h"
 #include "widgets/textfield.h"
 

@@ -1,6 +1,6 @@
 #include "lists/listload.h"
 
-#include "lists/listdialogsizes.h"
+#include "lists/smalldialogsizes.h"
 #include "widgets/textfield.h"
 
 #include <QHBoxLayout>

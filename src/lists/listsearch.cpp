@@ -1,6 +1,6 @@
 #include "lists/listsearch.h"
 
-#include "lists/listdialogsizes.h"
+#include "lists/smalldialogsizes.h"
 #include "platform/qlistbox.h"
 #include "widgets/textfield.h"
 

@@ -2,7 +2,7 @@
 
 #include "platform/displayproblems.h"
 #include "platform/droppedinput.h"
-#include "platform/keyletters.h"
+#include "platform/localeletters.h"
 #include "platform/toolkittexts.h"
 
 #include <QApplication>

@@ -1,4 +1,4 @@
-#include "platform/keyletters.h"
+#include "platform/localeletters.h"
 
 #include <algorithm>
 #include <cctype>
