@@ -18,6 +18,9 @@ public:
 
     /// An event that runs out of memory is over; the program is not, nor is a dialog that is open.
     bool notify(QObject *receiver, QEvent *event) override {
+        if (isDropped(receiver, event)) {
+            return true;
+        }
         try {
             return QApplication::notify(receiver, event);
         } catch (const std::bad_alloc &) {
@@ -43,7 +46,6 @@ KApplication::KApplication(const char *program, const char *name, bool hasDispla
     getLocale()->open(name, shared(QStringLiteral("locale")));
     if (hasDisplay) {
         installToolkitTexts();
-        dropRepeatedPresses();
         QGuiApplication::setDesktopFileName(name);
     }
 }
