@@ -77,9 +77,11 @@ private slots:
         for (const auto type : {QEvent::KeyPress, QEvent::KeyRelease}) {
             QCoreApplication::postEvent(apply, new QKeyEvent(type, Qt::Key_Space, {}));
         }
+        tabs()->setFocus();
         apply->click();
         QCoreApplication::processEvents();
         QCOMPARE(read(runs), "ran\n");
+        QVERIFY(!apply->hasFocus());
         press(mainDialog(), "Apply");
         QCOMPARE(read(runs), "ran\nran\n");
     }
