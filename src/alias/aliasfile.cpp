@@ -2,16 +2,14 @@
 
 #include "base/byteset.h"
 #include "base/lines.h"
-#include "base/productfile.h"
 #include "config/settings.h"
 
 #include <cctype>
 
 RecordChain<alias_entry> alias_list;
+ProductFile aliasFile;
 
 namespace {
-
-ProductFile aliasFile;
 
 constexpr ByteSet skippedBeginnings{"|# \r\n\t"};
 constexpr ByteSet wordEnds{"\t ,"};
@@ -73,18 +71,22 @@ void appendAlias(std::string &bytes, const alias_entry &alias) {
 
 } // namespace
 
-void parseAliases(KeptText bytes, RecordChain<alias_entry> &list) {
+std::size_t parseAliases(KeptText bytes, RecordChain<alias_entry> &list) {
     const ByteSet separators = ByteSet::of(separatesTargets);
     RecordAppender<alias_entry> end{&list.head};
     LinePieces lines{bytes};
+    LostLines lost;
     while (const std::optional<KeptText> line = lines.next()) {
         const KeptText text = lineText(*line);
         const std::size_t addressEnd = wordEnds.spanBefore(text);
-        if (!skippedBeginnings.holds(line->front()) && addressEnd < text.size()) {
+        const bool isAlias = !skippedBeginnings.holds(line->front()) && addressEnd < text.size();
+        if (isAlias) {
             alias_entry &alias = end.append({text.substr(0, addressEnd), {}});
             takeTargets(text.substr(addressEnd), separators, alias);
         }
+        lost.add(*line, holdsWord(line->substr(isAlias ? text.size() : 0)));
     }
+    return lost.count();
 }
 
 void formatAliases(const RecordChain<alias_entry> &list, std::string &bytes) {
@@ -95,7 +97,7 @@ void formatAliases(const RecordChain<alias_entry> &list, std::string &bytes) {
 
 int readAliasFile() {
     return aliasFile.read(settings().mail_file_alias.value, [](std::string bytes) {
-        parseAliases(keep(std::move(bytes)), alias_list);
+        aliasFile.lostLines = parseAliases(keep(std::move(bytes)), alias_list);
     });
 }
 

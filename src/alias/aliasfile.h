@@ -1,6 +1,7 @@
 #pragma once
 
 #include "base/kepttext.h"
+#include "base/productfile.h"
 #include "base/recordlist.h"
 
 #include <cstdint>
@@ -35,10 +36,11 @@ struct alias_entry {
 
 /// In the order of the file; the page puts new aliases at the head.
 extern RecordChain<alias_entry> alias_list;
+extern ProductFile aliasFile;
 
 /// Puts the aliases of the file's bytes at the end of `list`. Throws std::bad_alloc with what was
-/// read until then in the list.
-void parseAliases(KeptText bytes, RecordChain<alias_entry> &list);
+/// read until then in the list. How many lines have a word that is in no record.
+std::size_t parseAliases(KeptText bytes, RecordChain<alias_entry> &list);
 void formatAliases(const RecordChain<alias_entry> &list, std::string &bytes);
 
 /// Adds the file's aliases to alias_list. 0 when the file was read to its end, 1 when it cannot be

@@ -2,6 +2,7 @@
 
 #include "alias/aliasfile.h"
 #include "alias/mailalias.h"
+#include "app/applynote.h"
 #include "base/textfile.h"
 #include "config/masterfile.h"
 #include "config/productpaths.h"
@@ -19,21 +20,16 @@
 
 namespace {
 
-void readFiles() {
-    readMasterConfig();
-    readAliasFile();
-    readSmtpRejectFile();
-    readMailListFile();
-    parsePopHosts(settings().pop_hosts.value);
-}
-
-/// A signal that ends the program does so between two applies, not between two files.
-void writeFiles() {
+/// A signal that ends the program does so between two applies, not between two files, and when the
+/// services were told to read them. Two programs' applies do not mix.
+pid_t writeFilesAndStartCommand() {
+    const FolderLock lock{productPaths().master};
     const EndSignalsHeld held;
     writeAliasFile();
     writeSmtpRejectFile();
     writeMailListFile();
     writeMasterConfig();
+    return EndSignalsHeld::startShellCommand(productPaths().reconfigureCommand);
 }
 
 template <class Page>
@@ -93,7 +89,11 @@ QStringList pageNames() {
 
 KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
     : KControlApplication{argc, argv, name, pageNames()} {
-    readFiles();
+    readMasterConfig();
+    readAliasFile();
+    readSmtpRejectFile();
+    readMailListFile();
+    unreadFetchers_ = parsePopHosts(settings().pop_hosts.value);
     if (isInitOnly()) {
         return;
     }
@@ -104,11 +104,16 @@ KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
             addPage(pages_.at(index), row.label, row.helpFile);
         }
     }
-    if (!mayRewrite(productPaths().master)) {
-        setNote(getLocale()->translate(
-            translatable("Changes cannot be saved: this user may not write the master file.")));
-    }
+    showNote();
     showDialog();
+}
+
+void KTarvexApplication::showNote() {
+    constexpr std::size_t namesInLine = 3;
+    constexpr std::size_t namesInTip = 20;
+    // Without their page an apply leaves the fetchers' text as it is.
+    const std::size_t unread = isPageRequested("fetch") ? unreadFetchers_ : 0;
+    setNote(applyNote(unread, namesInLine), applyNote(unread, namesInTip));
 }
 
 void KTarvexApplication::applyChanges() {
@@ -117,7 +122,10 @@ void KTarvexApplication::applyChanges() {
             page->storeValues();
         }
     }
-    writeFiles();
     // What the command reports is its own business; the files are written whatever it says.
-    runShellCommand(productPaths().reconfigureCommand);
+    waitForCommand(writeFilesAndStartCommand());
+    if (masterFileObstacle() == Obstacle::None) {
+        unreadFetchers_ = 0;
+    }
+    showNote();
 }

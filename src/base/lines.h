@@ -1,5 +1,7 @@
 #pragma once
 
+#include <algorithm>
+#include <cctype>
 #include <cstddef>
 #include <cstring>
 #include <optional>
@@ -56,3 +58,31 @@ Text lineText(Text piece) {
     }
     return piece;
 }
+
+/// Whether there is more than white space and NULs in the bytes.
+inline bool holdsWord(std::string_view bytes) {
+    return std::ranges::any_of(
+        bytes, [](unsigned char byte) { return byte != '\0' && std::isspace(byte) == 0; });
+}
+
+/// What stands behind the first word, with nothing but white space before it.
+inline std::string_view behindWord(std::string_view bytes) {
+    const auto isSpace = [](unsigned char byte) { return std::isspace(byte) != 0; };
+    const auto word = std::ranges::find_if_not(bytes, isSpace);
+    return {std::find_if(word, bytes.end(), isSpace), bytes.end()};
+}
+
+/// Counts the lines of a file of which something is in no record. A line that is read in several
+/// pieces counts once.
+class LostLines {
+public:
+    void add(std::string_view piece, bool isLost) {
+        count_ += isLost && !isCounted_ ? 1 : 0;
+        isCounted_ = (isLost || isCounted_) && !piece.ends_with('\n');
+    }
+    [[nodiscard]] std::size_t count() const { return count_; }
+
+private:
+    std::size_t count_ = 0;
+    bool isCounted_ = false;
+};

@@ -1,13 +1,19 @@
 #include "base/textfile.h"
 
+#include <algorithm>
 #include <array>
 #include <cerrno>
 #include <fcntl.h>
+#include <filesystem>
+#include <limits>
+#include <sys/file.h>
 #include <sys/resource.h>
 #include <sys/stat.h>
 #include <sys/statvfs.h>
 #include <unistd.h>
 #include <utility>
+
+namespace fs = std::filesystem;
 
 namespace {
 
@@ -43,6 +49,8 @@ private:
     int number_;
 };
 
+constexpr std::size_t unlimited = std::numeric_limits<off_t>::max();
+
 /// Whether the file system says that it has `size` bytes left; some say nothing.
 bool hasSpaceLeft(int file, std::size_t size) {
     struct statvfs system = {};
@@ -50,12 +58,20 @@ bool hasSpaceLeft(int file, std::size_t size) {
            system.f_bavail * system.f_frsize >= size;
 }
 
-/// Gives back the space that the file has behind its end.
-void releaseSpace(int file) {
+/// Cuts the file to at most `longest` bytes, and gives back the space that it has behind its end.
+/// Never makes it longer: another process may have cut it meanwhile.
+bool cut(int file, std::size_t longest) {
     struct stat status = {};
-    if (::fstat(file, &status) == 0) {
-        [[maybe_unused]] const int result = ::ftruncate(file, status.st_size);
+    if (::fstat(file, &status) != 0) {
+        return false;
     }
+    const off_t size = std::min(status.st_size, static_cast<off_t>(longest));
+    while (::ftruncate(file, size) != 0) {
+        if (errno != EINTR) {
+            return false;
+        }
+    }
+    return true;
 }
 
 /// Sets space for `size` bytes aside for the file; where the file system cannot do that, asks
@@ -72,8 +88,18 @@ bool setSpaceAside(int file, off_t oldSize, std::size_t size) {
         const auto had = static_cast<std::size_t>(oldSize);
         return size <= had || hasSpaceLeft(file, size - had);
     }
-    releaseSpace(file); // A call that fails keeps what it got by then.
+    cut(file, unlimited); // A call that fails keeps what it got by then.
     return false;
+}
+
+/// The folder that the file at the path, or at the end of the link there, stands in.
+fs::path folderOf(fs::path path) {
+    constexpr int mostLinks = 40; // As many as the system follows.
+    std::error_code unknown;
+    for (int links = 0; links < mostLinks && fs::is_symlink(path, unknown); ++links) {
+        path = path.parent_path() / fs::read_symlink(path, unknown);
+    }
+    return path.has_parent_path() ? path.parent_path() : ".";
 }
 
 bool writeAll(int file, std::string_view bytes) {
@@ -93,7 +119,7 @@ bool writeAll(int file, std::string_view bytes) {
 FileRead readWholeFile(const std::string &path) {
     const FileDescriptor file{path, O_RDONLY};
     if (!file.isOpen()) {
-        return {std::nullopt, errno == ENOENT};
+        return {std::nullopt, errno == ENOENT || errno == ENOTDIR};
     }
     struct stat status = {};
     if (::fstat(file.number(), &status) != 0 || !S_ISREG(status.st_mode)) {
@@ -127,24 +153,35 @@ bool rewriteFile(const std::string &path, std::string_view bytes, mode_t newFile
         return false;
     }
     if (!writeAll(file.number(), bytes)) {
-        releaseSpace(file.number());
+        cut(file.number(), unlimited);
         return false;
     }
     // Only now, and only behind what was written: to cut it first would give the space away again.
-    const bool isCut =
-        !isRegular || ::ftruncate(file.number(), static_cast<off_t>(bytes.size())) == 0;
+    const bool isCut = !isRegular || cut(file.number(), bytes.size());
     // Before the next file is touched. What is no file, or on no disk, cannot, and need not.
     return (::fdatasync(file.number()) == 0 || errno == EINVAL || errno == EROFS) && isCut;
+}
+
+bool hasFolder(const std::string &path) {
+    std::error_code unknown;
+    return fs::is_directory(folderOf(path), unknown) || unknown == std::errc::permission_denied;
 }
 
 bool mayRewrite(const std::string &path) {
     const auto isAllowed = [](const std::string &file, int rights) {
         return ::faccessat(AT_FDCWD, file.c_str(), rights, AT_EACCESS) == 0;
     };
-    if (isAllowed(path, W_OK)) {
-        return true;
+    return isAllowed(path, W_OK) || (errno == ENOENT && isAllowed(folderOf(path), W_OK | X_OK));
+}
+
+FolderLock::FolderLock(const std::string &path)
+    : folder_{::open(folderOf(path).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC)} {
+    while (::flock(folder_, LOCK_EX) != 0 && errno == EINTR) {
     }
-    const std::size_t folderEnd = path.rfind('/');
-    return errno == ENOENT && folderEnd != std::string::npos &&
-           isAllowed(path.substr(0, folderEnd + 1), W_OK | X_OK);
+}
+
+FolderLock::~FolderLock() {
+    if (folder_ >= 0) {
+        ::close(folder_);
+    }
 }

@@ -41,40 +41,45 @@ std::string_view withoutBlanks(std::string_view text) {
     return text.substr(std::min(text.find_first_not_of(' '), text.size()));
 }
 
-/// The mask that follows an address; `rest` begins with the character that ended the address.
-std::uint32_t maskAfter(std::string_view rest) {
+/// Takes the mask that follows an address; `rest` begins with the character that ended the address.
+std::uint32_t takeMask(std::string_view &rest) {
     if (rest.starts_with('/') && rest.size() > 1) {
         for (const PrefixMask &prefix : prefixMasks) {
             if (prefix.digit == rest[1]) {
+                const std::string_view suffix = prefix.suffix;
+                rest.remove_prefix(rest.starts_with(suffix) ? suffix.size() : 0);
                 return htonl(prefix.mask);
             }
         }
     }
     if (rest.starts_with(' ')) {
-        rest = withoutBlanks(rest);
-        const std::size_t digits = rest.find_first_not_of("0123456789.");
-        return addressOf(rest.substr(0, std::min(digits, longestWord))).value_or(singleHost);
+        const std::string_view word = withoutBlanks(rest);
+        const std::size_t end = std::min(word.find_first_not_of("0123456789."), longestWord);
+        if (const std::optional<std::uint32_t> mask = addressOf(word.substr(0, end))) {
+            rest = word.substr(std::min(end, word.size()));
+            return *mask;
+        }
     }
     return singleHost;
 }
 
-/// `item` reaches from the comma before to the end of the text, for only the word says where it
-/// ends: a mask may still follow.
-std::optional<AccessListEntry> parseItem(std::string_view item) {
+/// Takes what it understands of the item, which reaches from the comma before to the end of the
+/// text, for only the word says where it ends: a mask may still follow.
+std::optional<AccessListEntry> takeItem(std::string_view &item) {
     item = withoutBlanks(item);
     const std::size_t wordEnd = std::min(item.find_first_of(" /,\r\n"), longestWord);
     const std::string word{item.substr(0, wordEnd)};
-    if (compareNoCase(word.c_str(), "none") == 0) {
-        return noHosts;
-    }
-    if (compareNoCase(word.c_str(), "all") == 0 || word == "*") {
-        return allHosts;
-    }
+    const bool isNone = compareNoCase(word.c_str(), "none") == 0;
+    const bool isAll = compareNoCase(word.c_str(), "all") == 0 || word == "*";
     const std::optional<std::uint32_t> address = addressOf(word);
-    if (!address) {
+    if (!isNone && !isAll && !address) {
         return std::nullopt;
     }
-    return AccessListEntry{.address = *address, .mask = maskAfter(item.substr(word.size()))};
+    item.remove_prefix(word.size());
+    if (isNone || isAll) {
+        return isNone ? noHosts : allHosts;
+    }
+    return AccessListEntry{.address = *address, .mask = takeMask(item)};
 }
 
 std::string formatEntry(const AccessListEntry &entry) {
@@ -94,7 +99,7 @@ std::string formatEntry(const AccessListEntry &entry) {
 
 } // namespace
 
-std::optional<AccessList> parseAccessList(std::string_view text) {
+std::optional<AccessList> parseAccessList(std::string_view text, bool *isWhole) {
     text = text.substr(0, text.find('\0'));
     if (text.empty()) {
         return std::nullopt;
@@ -103,10 +108,13 @@ std::optional<AccessList> parseAccessList(std::string_view text) {
     AccessList list;
     list.entries.reserve(static_cast<std::size_t>(std::ranges::count(text, ',')) + 1);
     while (!text.empty()) {
-        if (const std::optional<AccessListEntry> entry = parseItem(text)) {
+        if (const std::optional<AccessListEntry> entry = takeItem(text)) {
             list.entries.push_back(*entry);
         }
         const std::size_t comma = text.find(',');
+        if (isWhole != nullptr && !withoutBlanks(text.substr(0, comma)).empty()) {
+            *isWhole = false;
+        }
         text = comma == std::string_view::npos ? std::string_view{} : text.substr(comma + 1);
     }
     return list;
@@ -124,4 +132,10 @@ std::string formatAccessList(const AccessList &list) {
         text += formatEntry(entry);
     }
     return text;
+}
+
+bool isKeptWhole(std::string_view text) {
+    bool isWhole = true;
+    const AccessList list = parseAccessList(text, &isWhole).value_or(AccessList{});
+    return isWhole && parseAccessList(formatAccessList(list)).value_or(AccessList{}) == list;
 }

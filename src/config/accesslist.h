@@ -27,9 +27,14 @@ struct AccessList {
 };
 
 /// The list that `text` describes, without the items that cannot be read; none for an empty text.
-/// Throws std::bad_alloc.
-std::optional<AccessList> parseAccessList(std::string_view text);
+/// Where `isWhole` is given, it becomes false when something of the text is not in the list as it
+/// stands. Throws std::bad_alloc.
+std::optional<AccessList> parseAccessList(std::string_view text, bool *isWhole = nullptr);
 
 /// The text of the list. Once it holds 255 characters no further entry is added, so that a longer
 /// list is not whole in its text.
 std::string formatAccessList(const AccessList &list);
+
+/// Whether nothing is lost, widened or narrowed when the text is read and written. Throws
+/// std::bad_alloc.
+bool isKeptWhole(std::string_view text);

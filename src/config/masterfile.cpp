@@ -2,17 +2,21 @@
 
 #include "base/byteset.h"
 #include "base/lines.h"
-#include "base/productfile.h"
 #include "base/textfile.h"
 #include "config/productpaths.h"
 #include "config/settings.h"
 
+#include <algorithm>
+#include <cctype>
 #include <cstdio>
 #include <new>
+#include <unordered_map>
 
 namespace {
 
 ProductFile masterFile;
+LostSettings lost;
+bool hasTemplate = false;
 
 /// It holds passwords.
 constexpr mode_t newFileMode = 0640;
@@ -21,9 +25,61 @@ constexpr char commentMark = '|';
 constexpr char keyMark = '%';
 constexpr ByteSet blanks{" \t"};
 
+std::string_view trimmed(std::string_view text) {
+    text.remove_prefix(blanks.span(text));
+    return text.substr(0, text.find_last_not_of(" \t") + 1);
+}
+
+struct KeyLine {
+    std::string_view key;
+    std::string_view value;
+    bool hasColon;
+};
+
+/// Divides the text of a line that begins with the key mark.
+KeyLine divided(std::string_view text) {
+    const std::size_t colon = std::min(text.find(':'), text.size());
+    const bool hasColon = colon < text.size();
+    return {text.substr(1, colon - 1), text.substr(hasColon ? colon + 1 : colon), hasColon};
+}
+
+std::string lowered(std::string_view key) {
+    std::string letters{key};
+    std::ranges::transform(letters, letters.begin(), [](unsigned char letter) {
+        return static_cast<char>(std::tolower(letter));
+    });
+    return letters;
+}
+
+/// By their keys in small letters; views of the template's bytes.
+using TemplateLines = std::unordered_map<std::string, KeyLine>;
+
+TemplateLines templateLines(std::string_view masterTemplate) {
+    TemplateLines found;
+    LinePieces lines{masterTemplate};
+    while (const std::optional<std::string_view> line = lines.next()) {
+        if (line->front() == keyMark) {
+            const KeyLine keyLine = divided(lineText(*line));
+            found.insert_or_assign(lowered(keyLine.key), keyLine);
+        }
+    }
+    return found;
+}
+
+/// Names the key among the lost ones, or takes it from there: its last line counts.
+void note(std::vector<std::string> &keys, const std::string &key, bool isLost) {
+    std::erase(keys, key);
+    if (isLost && keys.size() < LostSettings::maximumNamed) {
+        keys.push_back(key);
+    }
+}
+
 /// Collects one setting's lines; hands them over when the next setting begins.
 class ValueReader {
 public:
+    explicit ValueReader(std::string_view masterTemplate)
+        : template_{templateLines(masterTemplate)} {}
+
     void begin(std::string_view key) {
         end();
         key_ = key;
@@ -39,15 +95,35 @@ public:
     }
 
     void end() const {
-        if (!key_.empty()) {
-            settingByKey(key_, value_);
+        if (key_.empty()) {
+            return;
         }
+        Setting *setting = settings().find(key_);
+        if (setting != nullptr) {
+            setting->exchange(value_);
+        }
+        // The template's line gets the store's value, or stays as it is.
+        const auto line = template_.find(lowered(key_));
+        const bool isKept = line != template_.end() &&
+                            (setting != nullptr ? line->second.hasColon
+                                                : trimmed(line->second.value) == trimmed(value_));
+        note(lost.keys, key_, !isKept);
+        note(lost.accessLists, key_,
+             isKept && dynamic_cast<AccessListSetting *>(setting) != nullptr &&
+                 !isKeptWhole(value_));
     }
 
 private:
+    TemplateLines template_;
     std::string key_;
     std::string value_;
 };
+
+std::optional<std::string> readTemplate() {
+    FileRead file = readWholeFile(productPaths().masterTemplate);
+    hasTemplate = file.bytes.has_value();
+    return std::move(file.bytes);
+}
 
 void appendValue(std::string &bytes, std::string_view value) {
     bytes += ": ";
@@ -75,8 +151,9 @@ void appendKeyLine(std::string &bytes, std::string_view line) {
 
 } // namespace
 
-void parseMasterConfig(std::string_view bytes) {
-    ValueReader setting;
+void parseMasterConfig(std::string_view bytes, std::string_view masterTemplate) {
+    ValueReader setting{masterTemplate};
+    lost = {};
     LinePieces lines{bytes};
     while (const std::optional<std::string_view> line = lines.next()) {
         std::string_view text = lineText(*line);
@@ -85,9 +162,9 @@ void parseMasterConfig(std::string_view bytes) {
             continue;
         }
         if (line->front() == keyMark) {
-            const std::size_t colon = text.find(':');
-            setting.begin(text.substr(1, colon == std::string_view::npos ? colon : colon - 1));
-            text.remove_prefix(colon == std::string_view::npos ? text.size() : colon + 1);
+            const KeyLine keyLine = divided(text);
+            setting.begin(keyLine.key);
+            text = keyLine.value;
         }
         setting.add(text);
     }
@@ -107,8 +184,9 @@ void formatMasterConfig(std::string_view masterTemplate, std::string &bytes) {
 
 int readMasterConfig() {
     const char *path = productPaths().master;
-    const int result =
-        masterFile.read(path, [](const std::string &bytes) { parseMasterConfig(bytes); });
+    const int result = masterFile.read(path, [](const std::string &bytes) {
+        parseMasterConfig(bytes, readTemplate().value_or(""));
+    });
     if (result == 1) {
         std::printf("Couldn't open config file:%s\n", path);
         std::fflush(stdout);
@@ -118,12 +196,19 @@ int readMasterConfig() {
 
 void writeMasterConfig() {
     try {
-        const FileRead masterTemplate = readWholeFile(productPaths().masterTemplate);
-        if (const std::optional<std::string> &lines = masterTemplate.bytes) {
-            masterFile.rewrite(
-                productPaths().master,
-                [&lines](std::string &bytes) { formatMasterConfig(*lines, bytes); }, newFileMode);
+        const std::optional<std::string> lines = readTemplate();
+        const auto format = [&lines](std::string &bytes) { formatMasterConfig(*lines, bytes); };
+        if (lines && masterFile.rewrite(productPaths().master, format, newFileMode)) {
+            lost = {};
         }
     } catch (const std::bad_alloc &) { // Like every failed write: nothing is reported.
     }
 }
+
+Obstacle masterFileObstacle() {
+    const Obstacle obstacle = masterFile.obstacle(productPaths().master);
+    const bool isEarlier = obstacle != Obstacle::None && obstacle != Obstacle::Appeared;
+    return isEarlier || hasTemplate ? obstacle : Obstacle::NoTemplate;
+}
+
+const LostSettings &lostSettings() { return lost; }

@@ -1,7 +1,10 @@
 #pragma once
 
+#include "base/productfile.h"
+
 #include <string>
 #include <string_view>
+#include <vector>
 
 /// The master file and its template share one line format. The first character decides:
 ///
@@ -13,8 +16,17 @@
 /// with "%" or "|") up to the next key line, joined with ","; comments and empty lines between them
 /// do not end it. On writing, the template gives keys, order and comments, the store the values.
 
-/// Hands each key and value to the store, in the order of the file.
-void parseMasterConfig(std::string_view bytes);
+/// What the next rewriting takes away although nobody edited it: the keys as the file spells them,
+/// the first of them.
+struct LostSettings {
+    static constexpr std::size_t maximumNamed = 21;
+    std::vector<std::string> keys; ///< The template names them not, or gives them another value.
+    std::vector<std::string> accessLists; ///< These lose items, or have some widened or narrowed.
+};
+
+/// Hands each key and value to the store, in the order of the file, and notes what will be lost of
+/// them with that template.
+void parseMasterConfig(std::string_view bytes, std::string_view masterTemplate = {});
 
 /// Appends the master file for the store's values. A key line that the store has no text for is
 /// kept as the template has it, and so is one without a colon.
@@ -27,3 +39,9 @@ int readMasterConfig();
 /// Rewrites the master file from the template; leaves it alone when there is no template, or when
 /// it was there and could not be read whole.
 void writeMasterConfig();
+
+/// What keeps writeMasterConfig from doing so, as far as that is known beforehand.
+Obstacle masterFileObstacle();
+
+/// As the file was read or rewritten last.
+const LostSettings &lostSettings();

@@ -54,24 +54,34 @@ bool takeEntry(std::string_view &text, pop_host &host) {
 
 } // namespace
 
-void parsePopHosts(TextOrNone text) {
+std::size_t parsePopHosts(TextOrNone text) {
     pop_host_list.clear();
     areWhole = true;
     std::string_view rest = text.value_or(std::string_view{});
+    std::size_t unread = 0;
+    std::size_t leftToCount = rest.size(); // Behind the entry that was counted last.
     RecordAppender<pop_host> end{&pop_host_list.head};
     try {
         for (;;) {
             rest.remove_prefix(betweenEntries.span(rest));
             if (rest.empty()) {
-                return;
+                return unread;
             }
+            const std::string_view entry = rest;
             pop_host host;
-            if (takeEntry(rest, host)) {
+            const bool isRead = takeEntry(rest, host);
+            if (isRead) {
                 end.append(host);
+            }
+            const bool isWhole = isRead && (rest.empty() || betweenEntries.holds(rest.front()));
+            if (!isWhole && entry.size() <= leftToCount) {
+                ++unread;
+                leftToCount = entry.size() - betweenEntries.spanBefore(entry);
             }
         }
     } catch (const std::bad_alloc &) {
         areWhole = false;
+        return 0; // They will not take the text's place.
     }
 }
 

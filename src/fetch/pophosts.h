@@ -42,8 +42,9 @@ void setPopHostText(std::array<char, size> &field, std::string_view text) {
 }
 
 /// Fills pop_host_list anew. Entries without their ":" or "@" are dropped. Every record gets the
-/// star flag. Out of memory keeps the records made so far.
-void parsePopHosts(TextOrNone text);
+/// star flag. Out of memory keeps the records made so far. How many entries are not whole in a
+/// record of their own.
+std::size_t parsePopHosts(TextOrNone text);
 
 /// Whether memory sufficed for all of the text that was parsed last. Otherwise pop_host_list must
 /// not take the text's place.

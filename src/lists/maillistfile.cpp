@@ -1,7 +1,6 @@
 #include "lists/maillistfile.h"
 
 #include "base/lines.h"
-#include "base/productfile.h"
 #include "config/settings.h"
 #include "config/settingvalues.h"
 
@@ -9,10 +8,9 @@
 #include <array>
 
 RecordChain<maillist_entry> maillist_list;
+ProductFile mailListFile;
 
 namespace {
-
-ProductFile mailListFile;
 
 constexpr std::size_t longestPiece = 249;
 constexpr std::size_t longestLoadedPiece = 254;
@@ -65,22 +63,30 @@ AddressChain *sectionOpened(maillist_entry &list, std::string_view startLine) {
     return nullptr;
 }
 
-void setField(maillist_entry &list, KeptText line) {
+std::string_view behindNumber(std::string_view text) {
+    return text.substr(std::min(text.find_first_not_of(" \t+-0123456789"), text.size()));
+}
+
+/// Sets the field that the line gives. Gives back what of the line is in no record; all of it where
+/// it takes the place of another.
+std::string_view setField(maillist_entry &list, KeptText line) {
     for (const auto &[key, field] : textKeys) {
         if (line.starts_with(key)) {
-            list.*field = line.substr(key.size());
-            return;
+            const std::string_view before = std::exchange(list.*field, line.substr(key.size()));
+            return before == list.*field || !holdsWord(before) ? std::string_view{} : line;
         }
     }
     for (const auto &[key, field] : numberKeys) {
         if (line.starts_with(key)) {
             list.*field = parseInteger(line.substr(key.size()));
-            return;
+            return behindNumber(line.substr(key.size()));
         }
     }
     if (line.starts_with(flagsKey)) {
         list.flags = static_cast<std::uint32_t>(parseInteger(line.substr(flagsKey.size())));
+        return behindNumber(line.substr(flagsKey.size()));
     }
+    return line;
 }
 
 /// Outside a list, inside a list, or inside one of its address sections.
@@ -88,34 +94,45 @@ class BlockReader {
 public:
     explicit BlockReader(RecordChain<maillist_entry> &lists) : lists_{lists} {}
 
-    void take(KeptText piece) {
+    /// Gives back what of the piece is in no record.
+    std::string_view take(KeptText piece) {
         if (section_ != nullptr) {
-            takeAddress(piece);
-        } else if (list_ != nullptr) {
-            takeLine(lineText(piece));
-        } else if (piece.starts_with("#new")) {
-            list_ = &prependRecord(&lists_.head, maillist_entry{});
+            return takeAddress(piece);
         }
+        if (list_ != nullptr) {
+            const KeptText line = lineText(piece);
+            const std::string_view lost = takeLine(line);
+            return holdsWord(lost) ? lost : piece.substr(line.size());
+        }
+        if (piece.starts_with("#new")) {
+            list_ = &prependRecord(&lists_.head, maillist_entry{});
+            return behindWord(piece);
+        }
+        return piece;
     }
 
 private:
-    void takeAddress(KeptText piece) {
+    std::string_view takeAddress(KeptText piece) {
         if (piece.starts_with('#')) {
             section_ = nullptr;
-        } else {
-            prependRecord(&section_->head, {lineText(piece)});
+            return piece.starts_with("#end") ? behindWord(piece) : piece;
         }
+        const KeptText line = lineText(piece);
+        prependRecord(&section_->head, {line});
+        return piece.substr(line.size());
     }
 
-    void takeLine(KeptText line) {
+    std::string_view takeLine(KeptText line) {
         if (line.starts_with("#endlist")) {
             list_ = nullptr;
-        } else if (line.starts_with("#start")) {
+            return behindWord(line);
+        }
+        if (line.starts_with("#start")) {
             section_ = sectionOpened(*list_, line);
             list_ = section_ != nullptr ? list_ : nullptr;
-        } else {
-            setField(*list_, line);
+            return section_ != nullptr ? behindWord(behindWord(line)) : line;
         }
+        return setField(*list_, line);
     }
 
     RecordChain<maillist_entry> &lists_;
@@ -129,17 +146,21 @@ void appendLine(std::string &bytes, std::string_view key, std::string_view value
     bytes += '\n';
 }
 
-void appendSection(std::string &bytes, std::string_view name, const AddressChain &addresses) {
+/// Adds the addresses that it leaves out to their number.
+void appendSection(std::string &bytes, std::string_view name, const AddressChain &addresses,
+                   std::size_t &leftOut) {
     appendLine(bytes, "#start ", name);
     for (const maillist_addr_entry &address : addresses) {
         if (!address.addr.starts_with('#') && address.addr.size() <= longestPiece) {
             appendLine(bytes, address.addr);
+        } else {
+            ++leftOut;
         }
     }
     appendLine(bytes, "#end");
 }
 
-void appendList(std::string &bytes, const maillist_entry &list) {
+void appendList(std::string &bytes, const maillist_entry &list, std::size_t &leftOut) {
     appendLine(bytes, "#new");
     for (const auto &[key, field] : textKeys) {
         appendLine(bytes, key, list.*field);
@@ -149,25 +170,29 @@ void appendList(std::string &bytes, const maillist_entry &list) {
     }
     appendLine(bytes, flagsKey, formatUnsigned(list.flags));
     for (const auto &[name, chain] : sections) {
-        appendSection(bytes, name, list.*chain);
+        appendSection(bytes, name, list.*chain, leftOut);
     }
     bytes += "#endlist\n\n\n";
 }
 
 } // namespace
 
-void parseMailLists(KeptText bytes, RecordChain<maillist_entry> &lists) {
+std::size_t parseMailLists(KeptText bytes, RecordChain<maillist_entry> &lists) {
     BlockReader reader{lists};
     LinePieces pieces{bytes, longestPiece};
+    LostLines lost;
     while (const std::optional<KeptText> piece = pieces.next()) {
-        reader.take(*piece);
+        lost.add(*piece, holdsWord(reader.take(*piece)));
     }
+    return lost.count();
 }
 
-void formatMailLists(const RecordChain<maillist_entry> &lists, std::string &bytes) {
+std::size_t formatMailLists(const RecordChain<maillist_entry> &lists, std::string &bytes) {
+    std::size_t leftOut = 0;
     for (const maillist_entry &list : lists) {
-        appendList(bytes, list);
+        appendList(bytes, list, leftOut);
     }
+    return leftOut;
 }
 
 AddressChain parseAddressLines(KeptText bytes) {
@@ -189,11 +214,16 @@ std::size_t maximumBytesOf(KeptText maillist_entry::*field) {
 void readMailListFile() {
     maillist_list.clear();
     mailListFile.read(settings().mail_file_maillist.value, [](std::string bytes) {
-        parseMailLists(keep(std::move(bytes)), maillist_list);
+        mailListFile.lostLines = parseMailLists(keep(std::move(bytes)), maillist_list);
     });
 }
 
 void writeMailListFile() {
-    mailListFile.rewrite(settings().mail_file_maillist.value,
-                         [](std::string &bytes) { formatMailLists(maillist_list, bytes); });
+    std::size_t leftOut = 0;
+    const auto format = [&leftOut](std::string &bytes) {
+        leftOut = formatMailLists(maillist_list, bytes);
+    };
+    if (mailListFile.rewrite(settings().mail_file_maillist.value, format)) {
+        mailListFile.lostLines = leftOut;
+    }
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "base/kepttext.h"
+#include "base/productfile.h"
 #include "base/recordlist.h"
 
 #include <cstddef>
@@ -70,15 +71,16 @@ struct maillist_entry : maillist_fields {
 };
 
 extern RecordChain<maillist_entry> maillist_list;
+extern ProductFile mailListFile;
 
 /// Puts the lists of the file's bytes at the head of `lists`. Throws std::bad_alloc with what was
-/// read until then in the chain.
-void parseMailLists(KeptText bytes, RecordChain<maillist_entry> &lists);
+/// read until then in the chain. How many lines have a word that is in no record.
+std::size_t parseMailLists(KeptText bytes, RecordChain<maillist_entry> &lists);
 
 /// Addresses that begin with "#" are left out: such a line would end its section and take the
 /// addresses behind it along. So would the rest of one of more than 249 bytes, which the file's
-/// reader takes for a line of its own.
-void formatMailLists(const RecordChain<maillist_entry> &lists, std::string &bytes);
+/// reader takes for a line of its own. How many are left out.
+std::size_t formatMailLists(const RecordChain<maillist_entry> &lists, std::string &bytes);
 
 /// The addresses of a plain text file: every line that holds "@", whole. A line is taken in pieces
 /// of at most 254 bytes, and each address is put at the head. They are parts of the file, which so

@@ -58,7 +58,9 @@ void KControlApplication::addPage(KConfigWidget *page, const char *label, const 
     dialog_->addPage(page, QString::fromUtf8(label), QString::fromUtf8(helpFile));
 }
 
-void KControlApplication::setNote(const QString &text) { dialog_->setNote(text); }
+void KControlApplication::setNote(const QString &text, const QString &tip) {
+    dialog_->setNote(text, tip);
+}
 
 void KControlApplication::showDialog() {
     dialog_->addButtons();

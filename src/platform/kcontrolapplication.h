@@ -36,8 +36,8 @@ protected:
     /// Adds the page behind the others. `helpFile` is the name of a file in the help folder.
     void addPage(KConfigWidget *page, const char *label, const char *helpFile);
 
-    /// A line that the dialog shows above its buttons; to be called before it is shown.
-    void setNote(const QString &text);
+    /// A line that the dialog shows above its buttons, and what its tool tip says.
+    void setNote(const QString &text, const QString &tip);
 
     void showDialog();
 

@@ -25,7 +25,11 @@ QString toolkitCaption(const char *caption) {
 
 } // namespace
 
-KControlDialog::KControlDialog() : tabs_{new QTabWidget(this)}, layout_{new QVBoxLayout(this)} {
+KControlDialog::KControlDialog()
+    : tabs_{new QTabWidget(this)}, layout_{new QVBoxLayout(this)}, note_{new QLabel(this)} {
+    note_->setTextFormat(Qt::PlainText);
+    note_->setWordWrap(true);
+    note_->hide();
     // The window is wide enough for all tabs, rather than scrolling them.
     tabs_->setUsesScrollButtons(false);
     tabs_->tabBar()->installEventFilter(this);
@@ -40,12 +44,18 @@ void KControlDialog::addPage(KConfigWidget *page, const QString &label, const QS
     helpFiles_.append(helpFile);
 }
 
-void KControlDialog::addButtons() {
-    if (!note_.isEmpty()) {
-        auto *note = new QLabel(note_, this);
-        note->setWordWrap(true);
-        layout_->addWidget(note);
+void KControlDialog::setNote(const QString &text, const QString &tip) {
+    note_->setText(text);
+    // What could be taken for markup is none, and so the tip has lines of its own.
+    note_->setToolTip(tip == text ? QString{} : "<qt>" + tip.toHtmlEscaped() + "</qt>");
+    note_->setVisible(!text.isEmpty());
+    if (isVisible()) {
+        fitToScreen();
     }
+}
+
+void KControlDialog::addButtons() {
+    layout_->addWidget(note_);
     auto *help = new QPushButton(toolkitCaption("Help"), this);
     auto *ok = new QPushButton(toolkitCaption("OK"), this);
     auto *apply = new QPushButton(toolkitCaption("Apply"), this);
@@ -101,7 +111,7 @@ QWidget *KControlDialog::fieldOf(const QKeySequence &shortcut) const {
 
 void KControlDialog::fitToScreen() {
     const QSize available = availableSize(this);
-    if (fitsInto(available, layout_->totalMinimumSize())) {
+    if (tabs_->usesScrollButtons() || fitsInto(available, layout_->totalMinimumSize())) {
         return;
     }
     tabs_->setUsesScrollButtons(true);

@@ -7,6 +7,7 @@
 
 class HelpWindow;
 class KConfigWidget;
+class QLabel;
 class QTabWidget;
 class QVBoxLayout;
 
@@ -25,8 +26,8 @@ public:
     /// Takes the page over and puts it behind the others.
     void addPage(KConfigWidget *page, const QString &label, const QString &helpFile);
 
-    /// A line that stands above the buttons for good; none where `text` is empty.
-    void setNote(const QString &text) { note_ = text; }
+    /// A line above the buttons, with a tool tip where that says more; none where `text` is empty.
+    void setNote(const QString &text, const QString &tip);
 
     /// To be called when all pages are there: the Tab key then reaches the buttons behind them, and
     /// only now it is known whether the screen is high enough.
@@ -50,7 +51,7 @@ private:
 
     QTabWidget *tabs_;
     QVBoxLayout *layout_;
-    QString note_;
+    QLabel *note_;
     QStringList helpFiles_; ///< One for each tab.
     std::unique_ptr<HelpWindow> helpWindow_;
 };

@@ -2,9 +2,11 @@
 
 #include <array>
 #include <atomic>
+#include <cerrno>
 #include <csignal>
 #include <cstdlib>
 #include <fcntl.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 namespace {
@@ -12,6 +14,9 @@ namespace {
 std::atomic<unsigned> arrived{0}; ///< A bit for each signal that waits.
 
 void hold(int signal) { arrived |= 1U << signal; }
+
+constexpr const char *busVariable = "DBUS_SESSION_BUS_ADDRESS";
+bool isBusHidden = false;
 
 struct SignalHandler {
     int signal;
@@ -43,12 +48,27 @@ void prepareProcess() {
         }
     }
     exchange(writeSignals);
+    isBusHidden = ::geteuid() == 0 && std::getenv(busVariable) == nullptr &&
+                  ::setenv(busVariable, "disabled:", 0) == 0;
 }
 
-void runShellCommand(const char *command) {
-    exchange(writeSignals);
-    [[maybe_unused]] const int status = std::system(command);
-    exchange(writeSignals);
+pid_t EndSignalsHeld::startShellCommand(const char *command) {
+    const pid_t number = ::fork();
+    if (number == 0) {
+        exchange(writeSignals);
+        exchange(endSignals);
+        if (isBusHidden) {
+            ::unsetenv(busVariable);
+        }
+        ::execl("/bin/sh", "sh", "-c", command, nullptr);
+        ::_exit(127); // As the shell does for what it cannot start.
+    }
+    return number;
+}
+
+void waitForCommand(pid_t command) {
+    while (command > 0 && ::waitpid(command, nullptr, 0) < 0 && errno == EINTR) {
+    }
 }
 
 EndSignalsHeld::EndSignalsHeld() { exchange(endSignals); }

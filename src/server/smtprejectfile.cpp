@@ -2,16 +2,14 @@
 
 #include "base/byteset.h"
 #include "base/lines.h"
-#include "base/productfile.h"
 #include "config/settings.h"
 
 #include <cctype>
 
 RecordChain<smtpreject_entry> smtpreject_list;
+ProductFile rejectFile;
 
 namespace {
-
-ProductFile rejectFile;
 
 constexpr std::size_t longestPiece = 249;
 
@@ -23,15 +21,20 @@ bool endsWord(unsigned char character) { return character == '\0' || std::isspac
 
 } // namespace
 
-void parseSmtpRejects(KeptText bytes, RecordChain<smtpreject_entry> &list) {
+std::size_t parseSmtpRejects(KeptText bytes, RecordChain<smtpreject_entry> &list) {
     const ByteSet beginnings = ByteSet::of(beginsEntry);
     const ByteSet wordEnds = ByteSet::of(endsWord);
     LinePieces pieces{bytes, longestPiece};
+    LostLines lost;
     while (const std::optional<KeptText> piece = pieces.next()) {
-        if (beginnings.holds(piece->front())) {
-            prependRecord(&list.head, {piece->substr(0, wordEnds.spanBefore(*piece))});
+        const bool isEntry = beginnings.holds(piece->front());
+        const std::size_t end = isEntry ? wordEnds.spanBefore(*piece) : 0;
+        if (isEntry) {
+            prependRecord(&list.head, {piece->substr(0, end)});
         }
+        lost.add(*piece, holdsWord(piece->substr(end)));
     }
+    return lost.count();
 }
 
 void formatSmtpRejects(const RecordChain<smtpreject_entry> &list, std::string &bytes) {
@@ -44,7 +47,7 @@ void formatSmtpRejects(const RecordChain<smtpreject_entry> &list, std::string &b
 void readSmtpRejectFile() {
     smtpreject_list.clear();
     rejectFile.read(settings().mail_file_smtpreject.value, [](std::string bytes) {
-        parseSmtpRejects(keep(std::move(bytes)), smtpreject_list);
+        rejectFile.lostLines = parseSmtpRejects(keep(std::move(bytes)), smtpreject_list);
     });
 }
 

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "base/kepttext.h"
+#include "base/productfile.h"
 #include "base/recordlist.h"
 
 /// The SMTP server's block list, one word a line:
@@ -17,10 +18,11 @@ struct smtpreject_entry {
 
 /// Newest first.
 extern RecordChain<smtpreject_entry> smtpreject_list;
+extern ProductFile rejectFile;
 
 /// Puts the entries of the file's bytes at the head of `list`. Throws std::bad_alloc with what was
-/// read until then in the list.
-void parseSmtpRejects(KeptText bytes, RecordChain<smtpreject_entry> &list);
+/// read until then in the list. How many lines have a word that is in no record.
+std::size_t parseSmtpRejects(KeptText bytes, RecordChain<smtpreject_entry> &list);
 void formatSmtpRejects(const RecordChain<smtpreject_entry> &list, std::string &bytes);
 
 /// Fills smtpreject_list anew from the file; empty when it cannot be read.
