@@ -1,8 +1,9 @@
 #include "widgets/textfield.h"
 
 #include "platform/bytetext.h"
+#include "widgets/captions.h"
 
-#include <QEvent>
+#include <QKeyEvent>
 #include <QScreen>
 #include <QToolTip>
 #include <QValidator>
@@ -83,7 +84,7 @@ private:
 
 FieldRule lengthRule(std::size_t maximumBytes) {
     return {.maximumBytes = maximumBytes,
-            .toolTip = QStringLiteral("At most %1 bytes").arg(maximumBytes)};
+            .toolTip = translated(translatable("At most %1 bytes")).arg(maximumBytes)};
 }
 
 TextField::TextField(QWidget *parent) : QLineEdit(parent), validator_{new Validator(this)} {
@@ -102,7 +103,10 @@ void TextField::showBytes(std::string_view bytes) {
     setCursorPosition(0);
     setReadOnly(isTooLong);
     if (isTooLong) {
-        setToolTip(QStringLiteral("Too long to be edited here: this is its beginning"));
+        setToolTip(translated(translatable("Too long to be edited here: this is its beginning")));
+        QPalette unchangeable;
+        unchangeable.setColor(QPalette::Base, palette().color(QPalette::Window));
+        setPalette(unchangeable);
     }
 }
 
@@ -173,4 +177,13 @@ bool TextField::event(QEvent *event) {
         return true;
     }
     return QLineEdit::event(event);
+}
+
+void TextField::keyPressEvent(QKeyEvent *event) {
+    const bool isForDialog = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter ||
+                             event->key() == Qt::Key_Escape;
+    if (showsPartOnly() && !event->text().isEmpty() && !isForDialog) {
+        showTip(toolTip()); // Copying, too, takes the beginning only.
+    }
+    QLineEdit::keyPressEvent(event);
 }
