@@ -3,10 +3,12 @@
 #include "platform/bytetext.h"
 #include "widgets/captions.h"
 
+#include <QGuiApplication>
 #include <QKeyEvent>
 #include <QScreen>
 #include <QToolTip>
 #include <QValidator>
+#include <QWindow>
 
 #include <algorithm>
 
@@ -169,6 +171,12 @@ void TextField::showTip(const QString &tip) const {
         at = {field.x(), frame.bottom()};
     }
     QToolTip::showText(at, tip);
+    if (!isActiveWindow()) {
+        // As after a chooser: the tip goes when the window becomes active again.
+        connect(
+            qGuiApp, &QGuiApplication::focusWindowChanged, this, [this, tip] { showTip(tip); },
+            static_cast<Qt::ConnectionType>(Qt::QueuedConnection | Qt::SingleShotConnection));
+    }
 }
 
 bool TextField::event(QEvent *event) {
