@@ -7,5 +7,5 @@ set(note_en [[
 The mailboxes elsewhere from which mail is collected by POP3 are on the
 <a href="tarvex-mail-fetchers.html">Fetchers</a> tab.]])
 set(note_de [[
-Die Postfächer auf anderen Servern, aus denen Post über POP3 abgeholt wird, finden Sie auf dem Reiter
+Die Postfächer auf anderen Servern, aus denen E-Mails über POP3 abgeholt werden, finden Sie auf dem Reiter
 <a href="tarvex-mail-fetchers.html">Fetchers</a>.]])

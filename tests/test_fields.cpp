@@ -29,7 +29,8 @@ std::string pasted(const std::string &row, NewField newField) {
     }
     field->setCursorPosition(static_cast<int>(parts.at(0).size()));
     paste(field, parts.at(1));
-    return (field->isReadOnly() ? "read-only: " : "") + field->keptText(stored);
+    return (field->isReadOnly() ? QToolTip::text().toStdString() + ": " : "") +
+           field->keptText(stored);
 }
 
 /// Whether the dialog closes on a text that came neither from keys nor from the clipboard.

@@ -13,6 +13,7 @@
 #include <QMessageBox>
 #include <QTemporaryDir>
 #include <QTemporaryFile>
+#include <QToolTip>
 
 #include <memory>
 
@@ -289,6 +290,7 @@ private slots:
                 QCOMPARE(seen.section('/', 0, 2), name + (" in " + folder.path()));
                 const bool isTaken = isAccepted && !path.contains(QChar::ReplacementCharacter);
                 QVERIFY2(field->text() == (isTaken ? path : folder.path()), qPrintable(path));
+                QVERIFY(isTaken || !isAccepted || !QToolTip::text().isEmpty());
             }
         }
     }

@@ -80,6 +80,8 @@ private slots:
         QVERIFY(window.selected.empty());
         QVERIFY(window.dialog.isVisible());
         QCOMPARE(window.current(), "-1");
+        QTest::keyClick(window.box, Qt::Key_End);
+        QCOMPARE(window.current(), "4");
     }
 
     void focusIsSeen() {

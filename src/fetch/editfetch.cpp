@@ -5,12 +5,12 @@
 
 namespace {
 
-FieldRule ruleFor(std::size_t size) {
+/// `toolTip` has the number at its "%1".
+FieldRule ruleFor(std::size_t size, TranslatableText toolTip) {
     const std::size_t maximum = size - 1;
     return {.refused = QStringLiteral(":@,"),
             .maximumBytes = maximum,
-            .toolTip =
-                QStringLiteral("At most %1 bytes, without \":\", \"@\" and \",\"").arg(maximum)};
+            .toolTip = translated(toolTip).arg(maximum)};
 }
 
 } // namespace
@@ -26,14 +26,16 @@ EditFetch::EditFetch(QWidget *parent, const char *name, const pop_host *host)
     addButtons(pageBorder, 15);
     fixSize({250, 140}, {247, 110});
 
-    server_->setRule(ruleFor(shown.server.size()));
-    password_->setRule(ruleFor(shown.password.size()));
-    FieldRule userRule = ruleFor(shown.user.size());
+    const TranslatableText rule = translatable("At most %1 bytes, without \":\", \"@\" and \",\"");
+    server_->setRule(ruleFor(shown.server.size(), rule));
+    password_->setRule(ruleFor(shown.password.size(), rule));
+    FieldRule userRule =
+        ruleFor(shown.user.size(),
+                translatable("At most %1 bytes, without \":\", \"@\" and \",\";\n"
+                             "not beginning with \"-\", \"*\", \"%\", \"|\" or a blank"));
     // A new entry stands without a prefix at the beginning of a line, where these have a meaning of
     // their own or, like white space, are dropped.
     userRule.refusedFirst = QStringLiteral("-*%| \t\r\n") + QChar(u'\0');
-    userRule.toolTip +=
-        QStringLiteral("; not beginning with \"-\", \"*\", \"%\", \"|\" or a blank");
     user_->setRule(userRule);
 }
 

@@ -1,5 +1,6 @@
 #include "platform/helpwindow.h"
 
+#include "platform/kapplication.h"
 #include "platform/screensize.h"
 
 #include <QCoreApplication>
@@ -33,6 +34,8 @@ HelpWindow::HelpWindow(QString folder)
     resize(QSize{640, 560}.boundedTo(availableSize(this)));
     browser_->setAccessibleName(help);
     browser_->setOpenLinks(false);
+    browser_->setTextInteractionFlags(browser_->textInteractionFlags() |
+                                      Qt::TextSelectableByKeyboard);
     auto *close = new QPushButton(QCoreApplication::translate("QPlatformTheme", "Close"), this);
     close->setDefault(true);
     auto *layout = new QVBoxLayout(this);
@@ -48,9 +51,10 @@ void HelpWindow::showFile(const QString &file) {
     const QString path = firstInstalled(folder_, file);
     if (path.isEmpty()) {
         setWindowTitle(browser_->accessibleName());
-        browser_->setPlainText(QStringLiteral("The help file \"%1\" is not installed.\n\n"
-                                              "It was looked for in the folders below %2.")
-                                   .arg(file, folder_));
+        const QString text = KApplication::getLocale()->translate(
+            translatable("The help file \"%1\" is not installed.\n\n"
+                         "It was looked for in the folders below %2."));
+        browser_->setPlainText(text.arg(file, folder_));
     } else {
         browser_->setSource(QUrl::fromLocalFile(path));
     }
@@ -68,5 +72,7 @@ void HelpWindow::follow(const QUrl &link) {
         QUrl target = QUrl::fromLocalFile(path);
         target.setFragment(link.fragment());
         browser_->setSource(target);
+        // The caret stays at the link otherwise, and the next key would lead back there.
+        browser_->setTextCursor(browser_->cursorForPosition({}));
     }
 }

@@ -163,6 +163,13 @@ void QListBox::keyPressEvent(QKeyEvent *event) {
     }
 }
 
+QModelIndex QListBox::moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) {
+    if (action == MoveEnd && !currentIndex().isValid()) {
+        return rows_->index(count() - 1); // The view would go to the first.
+    }
+    return QListView::moveCursor(action, modifiers);
+}
+
 void QListBox::mouseDoubleClickEvent(QMouseEvent *event) {
     const QModelIndex index = indexAt(event->position().toPoint());
     event->accept();

@@ -18,21 +18,21 @@ namespace {
 constexpr QSize buttonSize{70, 30};
 constexpr int minimumCharactersSeen = 16;
 
-/// There is no path after "Cancel", and the toolkit replaces bytes of a name that are not UTF-8:
-/// such a path would lead elsewhere.
-bool isWholePath(const QString &path) {
-    return !path.isEmpty() && !path.contains(QChar::ReplacementCharacter);
-}
-
 void browse(TextField *field, QFileDialog &chooser) {
     addHelpKey(&chooser);
     chooser.resize(chooser.sizeHint().boundedTo(availableSize(&chooser)));
     chooser.setWindowModality(Qt::WindowModal); // The help stays usable here as well.
-    if (field->showsPartOnly() || chooser.exec() != QDialog::Accepted) {
+    if (field->showsPartOnly()) {
+        return field->showTip(field->toolTip());
+    }
+    if (chooser.exec() != QDialog::Accepted) {
         return;
     }
     const QString path = chooser.selectedFiles().value(0);
-    if (isWholePath(path)) {
+    // The toolkit replaces bytes of a name that are not UTF-8: such a path would lead elsewhere.
+    if (path.contains(QChar::ReplacementCharacter)) {
+        field->showTip(translated(translatable("The path is not UTF-8 and cannot be taken")));
+    } else if (!path.isEmpty()) {
         field->replaceText(path);
     }
 }

@@ -56,10 +56,11 @@ void SettingsForm::text(const char *caption, TextSetting &setting) {
 void SettingsForm::accessList(const char *caption, AccessListSetting &setting) {
     TextField *field = newTextField(
         caption, accessListSetting(setting.value, std::nullopt).value_or(std::string{}));
-    const QString syntax =
-        QStringLiteral("\"all\", \"none\" or IPv4 addresses, with commas between them.\n"
-                       "Behind an address: /8, /16, /24 or /32, or a blank and a mask.\n"
-                       "Any other size is stored as one of these: 172.16.0.0/12 as 172.16.0.0/16.");
+    const QString syntax = translated(
+        translatable("\"all\", \"none\" or IPv4 addresses, with commas between them.\n"
+                     "Behind an address: /0 (every address), /8, /16, /24 or /32, or a blank and a "
+                     "mask.\n"
+                     "Any other size is stored as one of these: 172.16.0.0/12 as 172.16.0.0/16."));
     field->setToolTip(syntax);
     field->setAccessibleDescription(syntax);
     stores_.emplace_back([field, &setting] { accessListSetting(setting.value, field->bytes()); });

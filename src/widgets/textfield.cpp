@@ -1,11 +1,14 @@
 #include "widgets/textfield.h"
 
 #include "platform/bytetext.h"
+#include "widgets/captions.h"
 
-#include <QEvent>
+#include <QGuiApplication>
+#include <QKeyEvent>
 #include <QScreen>
 #include <QToolTip>
 #include <QValidator>
+#include <QWindow>
 
 #include <algorithm>
 
@@ -83,7 +86,7 @@ private:
 
 FieldRule lengthRule(std::size_t maximumBytes) {
     return {.maximumBytes = maximumBytes,
-            .toolTip = QStringLiteral("At most %1 bytes").arg(maximumBytes)};
+            .toolTip = translated(translatable("At most %1 bytes")).arg(maximumBytes)};
 }
 
 TextField::TextField(QWidget *parent) : QLineEdit(parent), validator_{new Validator(this)} {
@@ -102,7 +105,10 @@ void TextField::showBytes(std::string_view bytes) {
     setCursorPosition(0);
     setReadOnly(isTooLong);
     if (isTooLong) {
-        setToolTip(QStringLiteral("Too long to be edited here: this is its beginning"));
+        setToolTip(translated(translatable("Too long to be edited here: this is its beginning")));
+        QPalette unchangeable;
+        unchangeable.setColor(QPalette::Base, palette().color(QPalette::Window));
+        setPalette(unchangeable);
     }
 }
 
@@ -165,6 +171,12 @@ void TextField::showTip(const QString &tip) const {
         at = {field.x(), frame.bottom()};
     }
     QToolTip::showText(at, tip);
+    if (!isActiveWindow()) {
+        // As after a chooser: the tip goes when the window becomes active again.
+        connect(
+            qGuiApp, &QGuiApplication::focusWindowChanged, this, [this, tip] { showTip(tip); },
+            static_cast<Qt::ConnectionType>(Qt::QueuedConnection | Qt::SingleShotConnection));
+    }
 }
 
 bool TextField::event(QEvent *event) {
@@ -173,4 +185,13 @@ bool TextField::event(QEvent *event) {
         return true;
     }
     return QLineEdit::event(event);
+}
+
+void TextField::keyPressEvent(QKeyEvent *event) {
+    const bool isForDialog = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter ||
+                             event->key() == Qt::Key_Escape;
+    if (showsPartOnly() && !event->text().isEmpty() && !isForDialog) {
+        showTip(toolTip()); // Copying, too, takes the beginning only.
+    }
+    QLineEdit::keyPressEvent(event);
 }

@@ -35,7 +35,8 @@ public:
 
     explicit TextField(QWidget *parent);
 
-    /// Of a text longer than maximumBytes only the beginning is shown, and it cannot be edited.
+    /// Of a text longer than maximumBytes only the beginning is shown, and it cannot be edited: the
+    /// field looks so, and says why when a key is pressed in it.
     void showBytes(std::string_view bytes);
     /// Whether the field was given a text that it does not show whole; then that text still holds.
     [[nodiscard]] bool showsPartOnly() const { return isReadOnly(); }
@@ -61,6 +62,7 @@ public:
 
 protected:
     bool event(QEvent *event) override;
+    void keyPressEvent(QKeyEvent *event) override;
 
 private:
     class Validator;
