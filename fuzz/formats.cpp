@@ -8,6 +8,7 @@
 #include "server/smtprejectfile.h"
 
 #include <algorithm>
+#include <functional>
 #include <sanitizer/asan_interface.h>
 
 namespace {
@@ -30,8 +31,8 @@ KeptText placed(std::string_view bytes) {
 
 template <class Record>
 struct Format {
-    void (*parse)(KeptText, RecordChain<Record> &);
-    void (*format)(const RecordChain<Record> &, std::string &);
+    std::size_t (*parse)(KeptText, RecordChain<Record> &);
+    std::function<void(const RecordChain<Record> &, std::string &)> format;
     std::string (*shown)(const Record &); ///< All that a record holds.
 
     [[nodiscard]] RecordChain<Record> read(std::string_view bytes) const {
@@ -95,9 +96,9 @@ std::string shownWord(const smtpreject_entry &entry) {
     return std::string{std::string_view{entry.domain}} + '\n';
 }
 
-constexpr Format<alias_entry> aliasFile{parseAliases, formatAliases, shownAlias};
-constexpr Format<maillist_entry> mailListFile{parseMailLists, formatMailLists, shownList};
-constexpr Format<smtpreject_entry> rejectFile{parseSmtpRejects, formatSmtpRejects, shownWord};
+const Format<alias_entry> aliasFormat{parseAliases, formatAliases, shownAlias};
+const Format<maillist_entry> mailListFormat{parseMailLists, formatMailLists, shownList};
+const Format<smtpreject_entry> rejectFormat{parseSmtpRejects, formatSmtpRejects, shownWord};
 
 /// The texts of a list that reading turns round, in the order of the input.
 template <class Record>
@@ -211,7 +212,7 @@ void masterfile(std::string_view bytes) {
 }
 
 void aliases(std::string_view bytes) {
-    RecordChain<alias_entry> list = aliasFile.read(bytes);
+    RecordChain<alias_entry> list = aliasFormat.read(bytes);
     std::vector<std::string_view> texts;
     for (const alias_entry &alias : list) {
         texts.emplace_back(alias.address);
@@ -220,15 +221,15 @@ void aliases(std::string_view bytes) {
         }
     }
     requireParts(texts, bytes);
-    RecordChain<alias_entry> again = aliasFile.readAgain(list);
+    RecordChain<alias_entry> again = aliasFormat.readAgain(list);
     settle(list);
     settle(again);
-    aliasFile.requireSame(list, again);
-    aliasFile.requireComesBack(list);
+    aliasFormat.requireSame(list, again);
+    aliasFormat.requireComesBack(list);
 }
 
 void maillists(std::string_view bytes) {
-    RecordChain<maillist_entry> lists = mailListFile.read(bytes);
+    RecordChain<maillist_entry> lists = mailListFormat.read(bytes);
     for (maillist_entry &list : lists) {
         for (const KeptText &text : {list.name, list.post, list.admin, list.support, list.footer,
                                      list.header, list.modrt, list.info}) {
@@ -240,7 +241,7 @@ void maillists(std::string_view bytes) {
             removeAll(*chain, [](const auto &address) { return address.addr.size() == 249; });
         }
     }
-    mailListFile.requireComesBack(lists);
+    mailListFormat.requireComesBack(lists);
 }
 
 void fetchers(std::string_view bytes) {
@@ -259,9 +260,9 @@ void fetchers(std::string_view bytes) {
 }
 
 void rejects(std::string_view bytes) {
-    const RecordChain<smtpreject_entry> list = rejectFile.read(bytes);
+    const RecordChain<smtpreject_entry> list = rejectFormat.read(bytes);
     requireParts(inputOrder(list, &smtpreject_entry::domain), bytes);
-    rejectFile.requireComesBack(list);
+    rejectFormat.requireComesBack(list);
 }
 
 void loadedlines(std::string_view bytes) {

@@ -41,7 +41,7 @@ inline std::string bytesAt(const std::string &path) {
 
 /// What a format makes of a list.
 template <class List>
-std::string whole(void (*format)(const List &, std::string &), const List &list) {
+std::string whole(auto format, const List &list) {
     std::string bytes;
     format(list, bytes);
     return bytes;
