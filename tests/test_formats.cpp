@@ -80,6 +80,23 @@ private slots:
         checkRows(rewrittenFetchers, "[fetchers]");
     }
 
+    /// What an apply would take away unasked.
+    void lossesAreCounted() {
+        const auto lostBy = [](auto parse, auto list) {
+            return [parse, list](const std::string &bytes) {
+                list->clear();
+                return std::to_string(parse(keep(bytes), *list));
+            };
+        };
+        checkRows(lostBy(parseAliases, &alias_list), "[lost of aliases]");
+        checkRows(lostBy(parseSmtpRejects, &smtpreject_list), "[lost of rejects]");
+        checkRows(lostBy(parseMailLists, &maillist_list), "[lost of mail lists]");
+        checkRows([](const std::string &text) { return std::to_string(parsePopHosts(text)); },
+                  "[lost of fetchers]");
+        checkRows([](const std::string &text) { return isKeptWhole(text) ? "kept" : "lost"; },
+                  "[lost of access lists]");
+    }
+
     void newFetcherHasNoMark() {
         QCOMPARE(rewrittenFetchers("a:b@c"), "*a:b@c\n"s);
         pop_host_list.head->flags = 0;

@@ -116,14 +116,6 @@ private slots:
         close(reader);
     }
 
-    /// Rights are not what stops the tests' user; a folder that is not there is.
-    void foretellsWhetherAFileCanBeWritten() {
-        QVERIFY(mayRewrite(folder + "/new") &&
-                !QFile::exists(QString::fromStdString(folder + "/new")));
-        QVERIFY(rewriteFile(file, "x") && mayRewrite(file) && bytesAt(file) == "x");
-        QVERIFY(!mayRewrite(folder + "/no/new") && !mayRewrite(file + "/new") && !mayRewrite(""));
-    }
-
     /// A file server that holds a lease on a file gives it up when asked.
     void aLeaseIsWaitedFor() {
         for (const bool isRead : {true, false}) {

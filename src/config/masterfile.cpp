@@ -120,9 +120,14 @@ private:
 };
 
 std::optional<std::string> readTemplate() {
-    FileRead file = readWholeFile(productPaths().masterTemplate);
-    hasTemplate = file.bytes.has_value();
-    return std::move(file.bytes);
+    hasTemplate = false;
+    try {
+        FileRead file = readWholeFile(productPaths().masterTemplate);
+        hasTemplate = file.bytes.has_value();
+        return std::move(file.bytes);
+    } catch (const std::bad_alloc &) {
+        return std::nullopt;
+    }
 }
 
 void appendValue(std::string &bytes, std::string_view value) {
@@ -184,8 +189,9 @@ void formatMasterConfig(std::string_view masterTemplate, std::string &bytes) {
 
 int readMasterConfig() {
     const char *path = productPaths().master;
-    const int result = masterFile.read(path, [](const std::string &bytes) {
-        parseMasterConfig(bytes, readTemplate().value_or(""));
+    const std::optional<std::string> lines = readTemplate();
+    const int result = masterFile.read(path, [&lines](const std::string &bytes) {
+        parseMasterConfig(bytes, lines ? *lines : std::string_view{});
     });
     if (result == 1) {
         std::printf("Couldn't open config file:%s\n", path);
@@ -195,13 +201,10 @@ int readMasterConfig() {
 }
 
 void writeMasterConfig() {
-    try {
-        const std::optional<std::string> lines = readTemplate();
-        const auto format = [&lines](std::string &bytes) { formatMasterConfig(*lines, bytes); };
-        if (lines && masterFile.rewrite(productPaths().master, format, newFileMode)) {
-            lost = {};
-        }
-    } catch (const std::bad_alloc &) { // Like every failed write: nothing is reported.
+    const std::optional<std::string> lines = readTemplate();
+    const auto format = [&lines](std::string &bytes) { formatMasterConfig(*lines, bytes); };
+    if (lines && masterFile.rewrite(productPaths().master, format, newFileMode)) {
+        lost = {};
     }
 }
 

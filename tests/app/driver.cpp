@@ -27,7 +27,10 @@ static void writeTexts() {
         const auto *help = qobject_cast<const QTextBrowser *>(widget);
         const QString text =
             help != nullptr ? help->toPlainText() : widget->property("text").toString();
-        texts << (widget->isVisible() ? text.toStdString() + '\n' : "");
+        const bool isNote = widget->inherits("QLabel") && widget->parentWidget()->isWindow();
+        texts << (isNote ? "note " : "");
+        texts << (widget->isVisible() ? text.toStdString() + '\n' : "\n");
+        texts << (isNote ? "note tip " + widget->toolTip().toStdString() + '\n' : "");
     }
 }
 
