@@ -102,6 +102,5 @@ int readAliasFile() {
 }
 
 void writeAliasFile() {
-    aliasFile.rewrite(settings().mail_file_alias.value,
-                      [](std::string &bytes) { formatAliases(alias_list, bytes); });
+    aliasFile.rewrite([](std::string &bytes) { formatAliases(alias_list, bytes); });
 }

@@ -23,7 +23,7 @@ namespace {
 /// A signal that ends the program does so between two applies, not between two files, and when the
 /// services were told to read them. Two programs' applies do not mix.
 pid_t writeFilesAndStartCommand() {
-    const FolderLock lock{productPaths().master};
+    const std::shared_ptr<void> lock = lockFolderOf(productPaths().master);
     const EndSignalsHeld held;
     writeAliasFile();
     writeSmtpRejectFile();
@@ -124,7 +124,7 @@ void KTarvexApplication::applyChanges() {
     }
     // What the command reports is its own business; the files are written whatever it says.
     waitForCommand(writeFilesAndStartCommand());
-    if (masterFileObstacle() == Obstacle::None) {
+    if (!masterFileObstacle()) {
         unreadFetchers_ = 0;
     }
     showNote();

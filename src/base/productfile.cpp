@@ -2,6 +2,7 @@
 
 #include "base/textfile.h"
 
+#include <cerrno>
 #include <filesystem>
 #include <new>
 #include <utility>
@@ -16,7 +17,8 @@ bool isThere(const std::string &path) {
 } // namespace
 
 int ProductFile::read(const Path &path, const std::function<void(std::string bytes)> &take) {
-    found_ = Obstacle::NotRead;
+    path_ = path;
+    isWhole_ = false;
     try {
         FileRead file = path ? readWholeFile(*path) : FileRead{std::nullopt, true};
         if (file.bytes) {
@@ -24,27 +26,25 @@ int ProductFile::read(const Path &path, const std::function<void(std::string byt
             take(*std::move(file.bytes));
         }
         isMissing_ = file.isMissing;
-        found_ = file.bytes || isMissing_ ? Obstacle::None : Obstacle::NotRead;
+        isWhole_ = file.bytes || isMissing_;
         return file.bytes ? 0 : 1;
     } catch (const std::bad_alloc &) {
         return 2;
     }
 }
 
-bool ProductFile::rewrite(const Path &path, const std::function<void(std::string &bytes)> &format,
+bool ProductFile::rewrite(const std::function<void(std::string &bytes)> &format,
                           mode_t newFileMode) {
-    if (path && isMissing_ && isThere(*path)) {
-        found_ = Obstacle::Appeared;
-    }
     try {
-        if (!path || found_ != Obstacle::None) {
+        hasAppeared_ = hasAppeared_ || (path_ && isMissing_ && isThere(*path_));
+        if (!path_ || !isWhole_ || hasAppeared_) {
             return false;
         }
         std::string bytes;
         bytes.reserve(sizeRead_ + sizeRead_ / 8); // Edits seldom lengthen it by more.
         format(bytes);
-        const bool isDone = rewriteFile(*path, bytes, newFileMode);
-        isMissing_ = isMissing_ && !isThere(*path); // A file that is there now was made by this.
+        const bool isDone = rewriteFile(*path_, bytes, newFileMode);
+        isMissing_ = isMissing_ && !isThere(*path_); // What is there now was made by this.
         lostLines = isDone ? 0 : lostLines;
         return isDone;
     } catch (const std::bad_alloc &) { // Like every failed write: nothing is reported.
@@ -52,15 +52,21 @@ bool ProductFile::rewrite(const Path &path, const std::function<void(std::string
     }
 }
 
-Obstacle ProductFile::obstacle(const Path &path) const {
-    if (!path || path->empty()) {
-        return Obstacle::NoPath;
+std::optional<TranslatableText> ProductFile::obstacle() const {
+    if (!path_ || path_->empty()) {
+        return translatable("no file is set");
     }
-    if (found_ == Obstacle::NotRead) {
-        return found_;
+    if (!isWhole_) {
+        return translatable("the file could not be read");
     }
-    if (!hasFolder(*path)) {
-        return Obstacle::NoFolder;
+    switch (rewritingError(*path_)) {
+    case 0:
+        return hasAppeared_ ? std::optional{translatable("the file appeared meanwhile")}
+                            : std::nullopt;
+    case ENOENT:
+    case ENOTDIR:
+        return translatable("there is no such folder");
+    default:
+        return translatable("the file may not be written");
     }
-    return mayRewrite(*path) ? found_ : Obstacle::NotAllowed;
 }

@@ -162,26 +162,17 @@ bool rewriteFile(const std::string &path, std::string_view bytes, mode_t newFile
     return (::fdatasync(file.number()) == 0 || errno == EINVAL || errno == EROFS) && isCut;
 }
 
-bool hasFolder(const std::string &path) {
-    std::error_code unknown;
-    return fs::is_directory(folderOf(path), unknown) || unknown == std::errc::permission_denied;
-}
-
-bool mayRewrite(const std::string &path) {
-    const auto isAllowed = [](const std::string &file, int rights) {
-        return ::faccessat(AT_FDCWD, file.c_str(), rights, AT_EACCESS) == 0;
+int rewritingError(const std::string &path) {
+    const auto error = [](const std::string &name, int rights) {
+        return ::faccessat(AT_FDCWD, name.c_str(), rights, AT_EACCESS) == 0 ? 0 : errno;
     };
-    return isAllowed(path, W_OK) || (errno == ENOENT && isAllowed(folderOf(path), W_OK | X_OK));
+    const int ofFile = error(path, W_OK);
+    return ofFile == ENOENT ? error(folderOf(path), W_OK | X_OK) : ofFile;
 }
 
-FolderLock::FolderLock(const std::string &path)
-    : folder_{::open(folderOf(path).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC)} {
-    while (::flock(folder_, LOCK_EX) != 0 && errno == EINTR) {
+std::shared_ptr<void> lockFolderOf(const std::string &path) {
+    auto folder = std::make_shared<FileDescriptor>(folderOf(path), O_RDONLY | O_DIRECTORY);
+    while (::flock(folder->number(), LOCK_EX) != 0 && errno == EINTR) {
     }
-}
-
-FolderLock::~FolderLock() {
-    if (folder_ >= 0) {
-        ::close(folder_);
-    }
+    return folder;
 }

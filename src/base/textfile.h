@@ -1,5 +1,6 @@
 #pragma once
 
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -29,23 +30,10 @@ FileRead readWholeFile(const std::string &path);
 /// `newFileMode` is the mode of a file that was missing, less the process's umask.
 bool rewriteFile(const std::string &path, std::string_view bytes, mode_t newFileMode = 0666);
 
-/// Whether there is the folder that the file at the path, or at the end of the link there, stands
-/// in or would stand in.
-bool hasFolder(const std::string &path);
+/// What would keep rewriteFile from opening the file, as far as asking tells: 0 for nothing, or an
+/// error number. A missing file counts by its folder. Opens nothing and changes nothing.
+int rewritingError(const std::string &path);
 
-/// Whether rewriteFile would get to open the file, as far as asking tells. Opens nothing and
-/// changes nothing.
-bool mayRewrite(const std::string &path);
-
-/// Keeps other processes that take it too out of the folder of a file, as long as it lives. Waits
-/// for theirs; where it cannot be had there is none.
-class FolderLock {
-public:
-    explicit FolderLock(const std::string &path);
-    FolderLock(const FolderLock &) = delete;
-    FolderLock &operator=(const FolderLock &) = delete;
-    ~FolderLock();
-
-private:
-    int folder_;
-};
+/// Keeps other processes that take it too out of the file's folder as long as it lives; waits for
+/// theirs. Where it cannot be had there is none.
+std::shared_ptr<void> lockFolderOf(const std::string &path);

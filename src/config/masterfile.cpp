@@ -7,10 +7,9 @@
 #include "config/settings.h"
 
 #include <algorithm>
-#include <cctype>
 #include <cstdio>
+#include <map>
 #include <new>
-#include <unordered_map>
 
 namespace {
 
@@ -43,16 +42,14 @@ KeyLine divided(std::string_view text) {
     return {text.substr(1, colon - 1), text.substr(hasColon ? colon + 1 : colon), hasColon};
 }
 
-std::string lowered(std::string_view key) {
-    std::string letters{key};
-    std::ranges::transform(letters, letters.begin(), [](unsigned char letter) {
-        return static_cast<char>(std::tolower(letter));
-    });
-    return letters;
-}
+struct LettersAlike {
+    bool operator()(const std::string &a, const std::string &b) const {
+        return compareNoCase(a.c_str(), b.c_str()) < 0;
+    }
+};
 
-/// By their keys in small letters; views of the template's bytes.
-using TemplateLines = std::unordered_map<std::string, KeyLine>;
+/// By their keys; views of the template's bytes.
+using TemplateLines = std::map<std::string, KeyLine, LettersAlike>;
 
 TemplateLines templateLines(std::string_view masterTemplate) {
     TemplateLines found;
@@ -60,7 +57,7 @@ TemplateLines templateLines(std::string_view masterTemplate) {
     while (const std::optional<std::string_view> line = lines.next()) {
         if (line->front() == keyMark) {
             const KeyLine keyLine = divided(lineText(*line));
-            found.insert_or_assign(lowered(keyLine.key), keyLine);
+            found.insert_or_assign(std::string{keyLine.key}, keyLine);
         }
     }
     return found;
@@ -103,7 +100,7 @@ public:
             setting->exchange(value_);
         }
         // The template's line gets the store's value, or stays as it is.
-        const auto line = template_.find(lowered(key_));
+        const auto line = template_.find(key_);
         const bool isKept = line != template_.end() &&
                             (setting != nullptr ? line->second.hasColon
                                                 : trimmed(line->second.value) == trimmed(value_));
@@ -203,15 +200,14 @@ int readMasterConfig() {
 void writeMasterConfig() {
     const std::optional<std::string> lines = readTemplate();
     const auto format = [&lines](std::string &bytes) { formatMasterConfig(*lines, bytes); };
-    if (lines && masterFile.rewrite(productPaths().master, format, newFileMode)) {
+    if (lines && masterFile.rewrite(format, newFileMode)) {
         lost = {};
     }
 }
 
-Obstacle masterFileObstacle() {
-    const Obstacle obstacle = masterFile.obstacle(productPaths().master);
-    const bool isEarlier = obstacle != Obstacle::None && obstacle != Obstacle::Appeared;
-    return isEarlier || hasTemplate ? obstacle : Obstacle::NoTemplate;
+std::optional<TranslatableText> masterFileObstacle() {
+    const std::optional<TranslatableText> obstacle = masterFile.obstacle();
+    return obstacle || hasTemplate ? obstacle : translatable("there is no template");
 }
 
 const LostSettings &lostSettings() { return lost; }

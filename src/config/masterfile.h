@@ -40,8 +40,8 @@ int readMasterConfig();
 /// it was there and could not be read whole.
 void writeMasterConfig();
 
-/// What keeps writeMasterConfig from doing so, as far as that is known beforehand.
-Obstacle masterFileObstacle();
+/// Why writeMasterConfig will not do so, as far as that is known; none where it will.
+std::optional<TranslatableText> masterFileObstacle();
 
 /// As the file was read or rewritten last.
 const LostSettings &lostSettings();

@@ -223,7 +223,7 @@ void writeMailListFile() {
     const auto format = [&leftOut](std::string &bytes) {
         leftOut = formatMailLists(maillist_list, bytes);
     };
-    if (mailListFile.rewrite(settings().mail_file_maillist.value, format)) {
+    if (mailListFile.rewrite(format)) {
         mailListFile.lostLines = leftOut;
     }
 }

@@ -52,6 +52,5 @@ void readSmtpRejectFile() {
 }
 
 void writeSmtpRejectFile() {
-    rejectFile.rewrite(settings().mail_file_smtpreject.value,
-                       [](std::string &bytes) { formatSmtpRejects(smtpreject_list, bytes); });
+    rejectFile.rewrite([](std::string &bytes) { formatSmtpRejects(smtpreject_list, bytes); });
 }
