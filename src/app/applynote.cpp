@@ -58,7 +58,7 @@ void addFile(Note &note, const ProductFile &file, TranslatableText unsaved,
 QString applyNote(std::size_t unreadFetchers, std::size_t maximumNames) {
     Note note;
     if (isSaved(note, masterFileObstacle(), translatable("Settings will not be saved: %1."))) {
-        const auto &[keys, accessLists] = lostSettings();
+        const auto &[keys, accessLists] = lostSettings;
         if (!keys.empty()) {
             note.dropped << shown(translatable("settings that cannot be kept (%1)"))
                                 .arg(named(keys, maximumNames).join(", "));

@@ -32,11 +32,6 @@ pid_t writeFilesAndStartCommand() {
     return EndSignalsHeld::startShellCommand(productPaths().reconfigureCommand);
 }
 
-template <class Page>
-KConfigWidget *newPage(QWidget *parent, const char *name) {
-    return new Page(parent, name);
-}
-
 struct PageRow {
     KConfigWidget *(*newPage)(QWidget *parent, const char *name);
     const char *name;
@@ -44,35 +39,23 @@ struct PageRow {
     const char *helpFile;
 };
 
+template <class Page>
+constexpr PageRow pageRow(const char *name, const char *label, const char *helpFile) {
+    const auto newPage = [](QWidget *parent, const char *ownName) -> KConfigWidget * {
+        return new Page(parent, ownName);
+    };
+    return {.newPage = newPage, .name = name, .label = label, .helpFile = helpFile};
+}
+
 /// In the order of the tabs.
-constexpr std::array<PageRow, 7> pageRows{{{.newPage = newPage<MailSMTP>,
-                                            .name = "smtpserver",
-                                            .label = "&SMTP",
-                                            .helpFile = "tarvex-mail-smtp.html"},
-                                           {.newPage = newPage<MailPOP3>,
-                                            .name = "pop3server",
-                                            .label = "&POP3",
-                                            .helpFile = "tarvex-mail-pop3.html"},
-                                           {.newPage = newPage<MailIMAP>,
-                                            .name = "imapserver",
-                                            .label = "&IMAP",
-                                            .helpFile = "tarvex-mail-imap.html"},
-                                           {.newPage = newPage<MailFetch>,
-                                            .name = "fetch",
-                                            .label = "Fetchers",
-                                            .helpFile = "tarvex-mail-fetchers.html"},
-                                           {.newPage = newPage<MailDebatch>,
-                                            .name = "debatch",
-                                            .label = "&Delivery",
-                                            .helpFile = "tarvex-mail-delivery.html"},
-                                           {.newPage = newPage<MailAlias>,
-                                            .name = "alias",
-                                            .label = "&Aliasing",
-                                            .helpFile = "tarvex-mail-alias.html"},
-                                           {.newPage = newPage<MailList>,
-                                            .name = "list",
-                                            .label = "&Mail List",
-                                            .helpFile = "tarvex-mail-list.html"}}};
+constexpr std::array pageRows{
+    pageRow<MailSMTP>("smtpserver", "&SMTP", "tarvex-mail-smtp.html"),
+    pageRow<MailPOP3>("pop3server", "&POP3", "tarvex-mail-pop3.html"),
+    pageRow<MailIMAP>("imapserver", "&IMAP", "tarvex-mail-imap.html"),
+    pageRow<MailFetch>("fetch", "Fetchers", "tarvex-mail-fetchers.html"),
+    pageRow<MailDebatch>("debatch", "&Delivery", "tarvex-mail-delivery.html"),
+    pageRow<MailAlias>("alias", "&Aliasing", "tarvex-mail-alias.html"),
+    pageRow<MailList>("list", "&Mail List", "tarvex-mail-list.html")};
 
 /// Delivery stores before the fetchers, unlike the order of the tabs.
 constexpr std::array<std::size_t, pageRows.size()> storeOrder{0, 1, 2, 4, 3, 5, 6};

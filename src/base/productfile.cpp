@@ -3,18 +3,9 @@
 #include "base/textfile.h"
 
 #include <cerrno>
-#include <filesystem>
 #include <new>
+#include <unistd.h>
 #include <utility>
-
-namespace {
-
-bool isThere(const std::string &path) {
-    std::error_code unknown;
-    return std::filesystem::exists(path, unknown);
-}
-
-} // namespace
 
 int ProductFile::read(const Path &path, const std::function<void(std::string bytes)> &take) {
     path_ = path;
@@ -35,8 +26,9 @@ int ProductFile::read(const Path &path, const std::function<void(std::string byt
 
 bool ProductFile::rewrite(const std::function<void(std::string &bytes)> &format,
                           mode_t newFileMode) {
+    const auto isThere = [this] { return path_ && ::access(path_->c_str(), F_OK) == 0; };
     try {
-        hasAppeared_ = hasAppeared_ || (path_ && isMissing_ && isThere(*path_));
+        hasAppeared_ = hasAppeared_ || (isMissing_ && isThere());
         if (!path_ || !isWhole_ || hasAppeared_) {
             return false;
         }
@@ -44,7 +36,7 @@ bool ProductFile::rewrite(const std::function<void(std::string &bytes)> &format,
         bytes.reserve(sizeRead_ + sizeRead_ / 8); // Edits seldom lengthen it by more.
         format(bytes);
         const bool isDone = rewriteFile(*path_, bytes, newFileMode);
-        isMissing_ = isMissing_ && !isThere(*path_); // What is there now was made by this.
+        isMissing_ = isMissing_ && !isThere(); // What is there now was made by this.
         lostLines = isDone ? 0 : lostLines;
         return isDone;
     } catch (const std::bad_alloc &) { // Like every failed write: nothing is reported.

@@ -11,10 +11,11 @@
 #include <map>
 #include <new>
 
+LostSettings lostSettings;
+
 namespace {
 
 ProductFile masterFile;
-LostSettings lost;
 bool hasTemplate = false;
 
 /// It holds passwords.
@@ -104,8 +105,8 @@ public:
         const bool isKept = line != template_.end() &&
                             (setting != nullptr ? line->second.hasColon
                                                 : trimmed(line->second.value) == trimmed(value_));
-        note(lost.keys, key_, !isKept);
-        note(lost.accessLists, key_,
+        note(lostSettings.keys, key_, !isKept);
+        note(lostSettings.accessLists, key_,
              isKept && dynamic_cast<AccessListSetting *>(setting) != nullptr &&
                  !isKeptWhole(value_));
     }
@@ -155,7 +156,7 @@ void appendKeyLine(std::string &bytes, std::string_view line) {
 
 void parseMasterConfig(std::string_view bytes, std::string_view masterTemplate) {
     ValueReader setting{masterTemplate};
-    lost = {};
+    lostSettings = {};
     LinePieces lines{bytes};
     while (const std::optional<std::string_view> line = lines.next()) {
         std::string_view text = lineText(*line);
@@ -201,7 +202,7 @@ void writeMasterConfig() {
     const std::optional<std::string> lines = readTemplate();
     const auto format = [&lines](std::string &bytes) { formatMasterConfig(*lines, bytes); };
     if (lines && masterFile.rewrite(format, newFileMode)) {
-        lost = {};
+        lostSettings = {};
     }
 }
 
@@ -209,5 +210,3 @@ std::optional<TranslatableText> masterFileObstacle() {
     const std::optional<TranslatableText> obstacle = masterFile.obstacle();
     return obstacle || hasTemplate ? obstacle : translatable("there is no template");
 }
-
-const LostSettings &lostSettings() { return lost; }

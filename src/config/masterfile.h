@@ -24,6 +24,9 @@ struct LostSettings {
     std::vector<std::string> accessLists; ///< These lose items, or have some widened or narrowed.
 };
 
+/// As the file was read or rewritten last.
+extern LostSettings lostSettings;
+
 /// Hands each key and value to the store, in the order of the file, and notes what will be lost of
 /// them with that template.
 void parseMasterConfig(std::string_view bytes, std::string_view masterTemplate = {});
@@ -42,6 +45,3 @@ void writeMasterConfig();
 
 /// Why writeMasterConfig will not do so, as far as that is known; none where it will.
 std::optional<TranslatableText> masterFileObstacle();
-
-/// As the file was read or rewritten last.
-const LostSettings &lostSettings();
