@@ -31,6 +31,8 @@ struct Fault {
     fsblkcnt_t blocks = 0;  ///< Of a thousand bytes; 0 where it does not say.
     fsblkcnt_t blocksLeft = 0;
     rlim_t longestFile = RLIM_INFINITY;
+    int interruptions = 0;       ///< Of cutting the file.
+    bool isCutMeanwhile = false; ///< By another process, when it has been written.
 } present;
 
 std::string done; ///< "w" for each write, "s" for each time that a file is put on the disk.
@@ -72,7 +74,16 @@ ssize_t write(int fd, const void *buf, std::size_t n) {
     }
     present.writesLeft -= present.writesLeft > 0 ? 1 : 0;
     done += 'w';
-    return syscall(SYS_write, fd, buf, std::min(n, writtenAtOnce));
+    const long count = syscall(SYS_write, fd, buf, std::min(n, writtenAtOnce));
+    if (present.isCutMeanwhile) {
+        syscall(SYS_ftruncate, fd, 0L);
+    }
+    return count;
+}
+
+int ftruncate(int fd, off_t length) {
+    errno = EINTR;
+    return present.interruptions-- > 0 ? -1 : static_cast<int>(syscall(SYS_ftruncate, fd, length));
 }
 
 int fdatasync(int /*fildes*/) {
@@ -181,6 +192,15 @@ private slots:
             stat(file.c_str(), &after);
             QVERIFY2(isWritten || after.st_blocks <= before.st_blocks, name);
         }
+    }
+
+    void theCutOnlyShortens() {
+        QVERIFY(rewriteFile(file, std::string(1000, 'o')));
+        present = {.interruptions = 1};
+        QVERIFY(rewriteFile(file, "n") && bytesAt(file) == "n");
+        present = {.isCutMeanwhile = true};
+        QVERIFY(rewriteFile(file, "new") && bytesAt(file).empty());
+        present = {};
     }
 
     void whatWasNotReadWholeIsNeverRewritten() {

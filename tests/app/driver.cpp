@@ -19,6 +19,7 @@ static void say(char letter) { send(DRIVER_LINE, &letter, 1, MSG_NOSIGNAL); }
 
 static void writeTexts() {
     std::ofstream texts{"texts"};
+    texts << "bus " << qgetenv("DBUS_SESSION_BUS_ADDRESS").constData() << '\n';
     for (const QWidget *widget : QApplication::allWidgets()) {
         const auto *tabs = qobject_cast<const QTabBar *>(widget);
         for (int tab = 0; tabs != nullptr && tab < tabs->count(); ++tab) {

@@ -14,6 +14,7 @@
 #include <malloc.h>
 #include <sched.h>
 #include <set>
+#include <sys/file.h>
 #include <sys/resource.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
@@ -263,9 +264,23 @@ private slots:
         }
     }
 
+    void anotherProgramsApplyIsWaitedFor() {
+        lay();
+        const Program program;
+        QVERIFY(program.isReady());
+        const int folder = open("config", O_RDONLY | O_CLOEXEC);
+        QCOMPARE(flock(folder, LOCK_EX), 0);
+        program.press('A');
+        QCOMPARE(program.heard(300), '?');
+        QCOMPARE(state(), "0000");
+        close(folder);
+        QCOMPARE(program.heard(), 'A');
+        QCOMPARE(state(), "1111ran");
+    }
+
     void theCommandGetsWhatTheProgramGot() {
         for (unsigned closed = 0; closed < 8; ++closed) {
-            lay("(readlink /proc/$$/fd/[012]; ls /proc/self/fd;"
+            lay("(readlink /proc/$$/fd/[012]; ls /proc/self/fd; echo $DBUS_SESSION_BUS_ADDRESS;"
                 " sed -n 's/^SigI.*\\(.......\\)$/\\1/p' /proc/self/status) >seen");
             const bool isOdd = closed % 2 == 1;
             const Program program{
@@ -284,7 +299,7 @@ private slots:
             for (int number = 0; number < 3; ++number) {
                 wanted += (closed >> number & 1) != 0 ? "/dev/null\n" : "/dev/zero\n";
             }
-            wanted += "0\n1\n2\n3\n"; // The last is that of the list.
+            wanted += "0\n1\n2\n3\n\n"; // The last is that of the list.
             wanted += isOdd ? "1000001\n" : "0000000\n";
             QCOMPARE(bytesAt("config/seen"), wanted);
             QCOMPARE(state(), "1111ran");
