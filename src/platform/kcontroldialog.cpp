@@ -110,17 +110,22 @@ QWidget *KControlDialog::fieldOf(const QKeySequence &shortcut) const {
 }
 
 void KControlDialog::fitToScreen() {
+    // The layout would take the note's height from the pages'.
+    const QMargins margins = layout_->contentsMargins();
+    const int width = layout_->totalMinimumSize().width() - margins.left() - margins.right();
+    note_->setMinimumHeight(note_->heightForWidth(width));
     const QSize available = availableSize(this);
     if (tabs_->usesScrollButtons() || fitsInto(available, layout_->totalMinimumSize())) {
         return;
     }
     tabs_->setUsesScrollButtons(true);
     const QSize wanted = layout_->totalSizeHint();
+    const int current = tabs_->currentIndex();
     for (int index = 0; index < tabs_->count(); ++index) {
         const QString label = tabs_->tabText(index);
         tabs_->insertTab(index, scrolling(tabs_->widget(index)), label);
     }
-    tabs_->setCurrentIndex(0);
+    tabs_->setCurrentIndex(current);
     tabs_->updateGeometry(); // It forgets to, as long as it is not shown.
     resize(wanted.boundedTo(available));
 }
