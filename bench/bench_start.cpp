@@ -146,6 +146,13 @@ int runDialog(int argc, char **argv, bool isBare) {
     }
     auto *layout = new QVBoxLayout(&dialog);
     layout->addWidget(tabs);
+    if (!isBare) {
+        auto *line = new QLabel("An apply will drop: settings that cannot be kept "
+                                "(util.quote.enable), lines of the alias file (8), lines of the "
+                                "reject file (6), lines of the mailing-list file (3).");
+        line->setWordWrap(true);
+        layout->addWidget(line);
+    }
     auto *buttons = new QHBoxLayout;
     layout->addLayout(buttons);
     for (const char *label : {"Help", "OK", "Apply", "Cancel"}) {

@@ -84,7 +84,7 @@ std::size_t parseAliases(KeptText bytes, RecordChain<alias_entry> &list) {
             alias_entry &alias = end.append({text.substr(0, addressEnd), {}});
             takeTargets(text.substr(addressEnd), separators, alias);
         }
-        lost.add(*line, holdsWord(line->substr(isAlias ? text.size() : 0)));
+        lost.add(*line, line->substr(isAlias ? text.size() : 0));
     }
     return lost.count();
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
 #include <string_view>
@@ -33,11 +34,10 @@ public:
 
 private:
     [[nodiscard]] std::size_t span(std::string_view text, bool areMembers) const {
-        std::size_t end = 0;
-        while (end < text.size() && holds(text[end]) == areMembers) {
-            ++end;
-        }
-        return end;
+        const auto end = std::find_if(text.begin(), text.end(), [this, areMembers](char byte) {
+            return holds(byte) != areMembers;
+        });
+        return static_cast<std::size_t>(end - text.begin());
     }
 
     std::array<bool, 256> holds_{};

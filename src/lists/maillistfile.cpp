@@ -182,7 +182,7 @@ std::size_t parseMailLists(KeptText bytes, RecordChain<maillist_entry> &lists) {
     LinePieces pieces{bytes, longestPiece};
     LostLines lost;
     while (const std::optional<KeptText> piece = pieces.next()) {
-        lost.add(*piece, holdsWord(reader.take(*piece)));
+        lost.add(*piece, reader.take(*piece));
     }
     return lost.count();
 }

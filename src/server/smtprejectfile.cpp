@@ -32,7 +32,7 @@ std::size_t parseSmtpRejects(KeptText bytes, RecordChain<smtpreject_entry> &list
         if (isEntry) {
             prependRecord(&list.head, {piece->substr(0, end)});
         }
-        lost.add(*piece, holdsWord(piece->substr(end)));
+        lost.add(*piece, piece->substr(end));
     }
     return lost.count();
 }
