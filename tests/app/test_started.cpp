@@ -32,6 +32,55 @@ QString firstWrong(const Case &row) {
     return program.applies() ? "" : "it does not apply";
 }
 
+/// What is done to a product of which nothing is lost, and the line above the buttons; then again,
+/// before an apply and after it.
+struct NoteRow {
+    const char *lines, *note;
+    const char *later = ":", *noteAfterApply = "";
+};
+constexpr const char *noFile = "Aliases will not be saved: no file is set. Blocked domains "
+                               "will not be saved: no file is set. Mailing lists will not "
+                               "be saved: no file is set.";
+constexpr const char *noTemplate = "Settings will not be saved: there is no template.";
+const NoteRow noteRows[]{
+    {":", ""},
+    {"rm config/master", noFile, ":", noFile},
+    {"sed -i '/file.alias/s/:.*/:/' config/master", "Aliases will not be saved: no file is set.",
+     ":", "Aliases will not be saved: no file is set."},
+    {"chmod 200 config/alias; rm config/lists; mkdir config/lists",
+     "Aliases will not be saved: the file could not be read. "
+     "Mailing lists will not be saved: the file could not be read.",
+     "chmod 600 config/alias",
+     "Aliases will not be saved: the file could not be read. "
+     "Mailing lists will not be saved: the file could not be read."},
+    {"sed -i s:config/reject:none/x: config/master; ln -sf none/lists config/lists",
+     "Blocked domains will not be saved: there is no such folder. "
+     "Mailing lists will not be saved: there is no such folder.",
+     "mkdir none config/none"},
+    {"chmod 400 config/reject config/master; mkdir shut; ln -sf ../shut/x config/alias; "
+     "chmod 500 shut",
+     "Settings will not be saved: the file may not be written. "
+     "Aliases will not be saved: the file may not be written. "
+     "Blocked domains will not be saved: the file may not be written.",
+     "chmod 600 config/reject config/master; chmod 700 shut"},
+    {"rm config/templates/master; echo '%x: 1' >>config/master", noTemplate, ":", noTemplate},
+    {"rm config/alias; echo x >>config/reject", ""},
+    {"rm config/lists", "", "echo kept >config/lists",
+     "Mailing lists will not be saved: the file appeared meanwhile."},
+    {"printf '%%a: 1\\n%%B:\\n%%not.known:0 \\n' >>config/master",
+     "An apply will drop: settings that cannot be kept (a, B)."},
+    {"printf '%%not.known: 2\\n%%c:\\n%%d:\\n%%e:\\n' >>config/master; "
+     "sed -i '/smtp.time/s/:.*//' config/templates/master",
+     "An apply will drop: settings that cannot be kept (smtp.time, not.known, c, ...).", ":", ""},
+    {"printf '%%smtp.allow: 10.0.0.0/12\\n%%pop.block: x\\n' >>config/master; "
+     "printf '%%pop.block:\\n' >>config/templates/master",
+     "An apply will drop: items of smtp.allow, items of pop.block."},
+    {"printf '%%pop.hosts:a:b@c\\n\\tx\\n' >>config/master; echo '# c' | tee -a "
+     "config/alias "
+     "config/reject >>config/lists",
+     "An apply will drop: fetchers that cannot be read (1), lines of the alias file (1), "
+     "lines of the reject file (1), lines of the mailing-list file (1)."}};
+
 QString noteOf(const Program &program) {
     const QString texts =
         program.does('t') ? QString::fromStdString(bytesAt("texts")) : "note hangs";
@@ -79,60 +128,8 @@ private slots:
         }
     }
 
-    /// Of a product of which nothing is lost, but for what the lines do to it: before the start,
-    /// and before an apply.
     void lineAboveTheButtons() {
-        struct Row {
-            const char *lines, *note;
-            const char *later = ":", *noteAfterApply = "";
-        };
-        static const char *const noFile =
-            "Aliases will not be saved: no file is set. Blocked domains "
-            "will not be saved: no file is set. Mailing lists will not "
-            "be saved: no file is set.";
-        static const char *const noTemplate = "Settings will not be saved: there is no template.";
-        const Row rows[]{
-            {":", ""},
-            {"rm config/master", noFile, ":", noFile},
-            {"sed -i '/file.alias/s/:.*/:/' config/master",
-             "Aliases will not be saved: no file is set.", ":",
-             "Aliases will not be saved: no file is set."},
-            {"chmod 200 config/alias; rm config/lists; mkdir config/lists",
-             "Aliases will not be saved: the file could not be read. "
-             "Mailing lists will not be saved: the file could not be read.",
-             "chmod 600 config/alias",
-             "Aliases will not be saved: the file could not be read. "
-             "Mailing lists will not be saved: the file could not be read."},
-            {"sed -i s:config/reject:none/x: config/master; ln -sf none/lists config/lists",
-             "Blocked domains will not be saved: there is no such folder. "
-             "Mailing lists will not be saved: there is no such folder.",
-             "mkdir none config/none"},
-            {"chmod 400 config/reject config/master; mkdir shut; ln -sf ../shut/x config/alias; "
-             "chmod 500 shut",
-             "Settings will not be saved: the file may not be written. "
-             "Aliases will not be saved: the file may not be written. "
-             "Blocked domains will not be saved: the file may not be written.",
-             "chmod 600 config/reject config/master; chmod 700 shut"},
-            {"rm config/templates/master; echo '%x: 1' >>config/master", noTemplate, ":",
-             noTemplate},
-            {"rm config/alias; echo x >>config/reject", ""},
-            {"rm config/lists", "", "echo kept >config/lists",
-             "Mailing lists will not be saved: the file appeared meanwhile."},
-            {"printf '%%a: 1\\n%%B:\\n%%not.known:0 \\n' >>config/master",
-             "An apply will drop: settings that cannot be kept (a, B)."},
-            {"printf '%%not.known: 2\\n%%c:\\n%%d:\\n%%e:\\n' >>config/master; "
-             "sed -i '/smtp.time/s/:.*//' config/templates/master",
-             "An apply will drop: settings that cannot be kept (smtp.time, not.known, c, ...).",
-             ":", ""},
-            {"printf '%%smtp.allow: 10.0.0.0/12\\n%%pop.block: x\\n' >>config/master; "
-             "printf '%%pop.block:\\n' >>config/templates/master",
-             "An apply will drop: items of smtp.allow, items of pop.block."},
-            {"printf '%%pop.hosts:a:b@c\\n\\tx\\n' >>config/master; echo '# c' | tee -a "
-             "config/alias "
-             "config/reject >>config/lists",
-             "An apply will drop: fetchers that cannot be read (1), lines of the alias file (1), "
-             "lines of the reject file (1), lines of the mailing-list file (1)."}};
-        for (const auto &[lines, note, later, noteAfterApply] : rows) {
+        for (const auto &[lines, note, later, noteAfterApply] : noteRows) {
             layProduct();
             QVERIFY(chdir(TEST_PRODUCT) == 0 &&
                     shell(": >config/alias; : >config/reject; sed -i /not.known/d config/master"));
