@@ -55,16 +55,16 @@ void addFile(Note &note, const ProductFile &file, TranslatableText unsaved,
 
 } // namespace
 
-QString applyNote(std::size_t unreadFetchers, std::size_t maximumNames) {
+QString applyNote(std::size_t maximumNames) {
     Note note;
     if (isSaved(note, masterFileObstacle(), translatable("Settings will not be saved: %1."))) {
-        const auto &[keys, accessLists] = lostSettings;
+        const auto &[keys, accessLists, fetchers] = lostSettings;
         if (!keys.empty()) {
             note.dropped << shown(translatable("settings that cannot be kept (%1)"))
                                 .arg(named(keys, maximumNames).join(", "));
         }
         note.dropped << named(accessLists, maximumNames, shown(translatable("items of %1")));
-        addCount(note, unreadFetchers, translatable("fetchers that cannot be read (%1)"));
+        addCount(note, fetchers, translatable("fetchers that cannot be read (%1)"));
     }
     addFile(note, aliasFile, translatable("Aliases will not be saved: %1."),
             translatable("lines of the alias file (%1)"));

@@ -76,7 +76,9 @@ KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
     readAliasFile();
     readSmtpRejectFile();
     readMailListFile();
-    unreadFetchers_ = parsePopHosts(settings().pop_hosts.value);
+    const std::size_t unread = parsePopHosts(settings().pop_hosts.value);
+    // Without their page an apply leaves the fetchers' text as it is.
+    lostSettings.fetchers = isPageRequested("fetch") ? unread : 0;
     if (isInitOnly()) {
         return;
     }
@@ -94,9 +96,7 @@ KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
 void KTarvexApplication::showNote() {
     constexpr std::size_t namesInLine = 3;
     constexpr std::size_t namesInTip = 20;
-    // Without their page an apply leaves the fetchers' text as it is.
-    const std::size_t unread = isPageRequested("fetch") ? unreadFetchers_ : 0;
-    setNote(applyNote(unread, namesInLine), applyNote(unread, namesInTip));
+    setNote(applyNote(namesInLine), applyNote(namesInTip));
 }
 
 void KTarvexApplication::applyChanges() {
@@ -107,8 +107,5 @@ void KTarvexApplication::applyChanges() {
     }
     // What the command reports is its own business; the files are written whatever it says.
     waitForCommand(writeFilesAndStartCommand());
-    if (!masterFileObstacle()) {
-        unreadFetchers_ = 0;
-    }
     showNote();
 }

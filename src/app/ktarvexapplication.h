@@ -17,8 +17,6 @@ public:
 
 private:
     void showNote();
-
-    std::size_t unreadFetchers_ = 0;
     // In the order of the tabs. Null until created, and for good when the command line names other
     // pages. The dialog owns them.
     std::array<KConfigWidget *, 7> pages_{};

@@ -1,5 +1,6 @@
 #include "config/accesslist.h"
 
+#include "base/lines.h"
 #include "config/settingvalues.h"
 
 #include <algorithm>
@@ -112,7 +113,7 @@ std::optional<AccessList> parseAccessList(std::string_view text, bool *isWhole) 
             list.entries.push_back(*entry);
         }
         const std::size_t comma = text.find(',');
-        if (isWhole != nullptr && !withoutBlanks(text.substr(0, comma)).empty()) {
+        if (isWhole != nullptr && holdsWord(text.substr(0, comma))) {
             *isWhole = false;
         }
         text = comma == std::string_view::npos ? std::string_view{} : text.substr(comma + 1);

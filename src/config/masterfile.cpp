@@ -25,9 +25,11 @@ constexpr char commentMark = '|';
 constexpr char keyMark = '%';
 constexpr ByteSet blanks{" \t"};
 
-std::string_view trimmed(std::string_view text) {
-    text.remove_prefix(blanks.span(text));
-    return text.substr(0, text.find_last_not_of(" \t") + 1);
+/// How a value is spelled says nothing, nor how it is divided into lines.
+std::string withoutBlanksAndCommas(std::string_view value) {
+    std::string rest{value};
+    std::erase_if(rest, [](char byte) { return byte == ',' || blanks.holds(byte); });
+    return rest;
 }
 
 struct KeyLine {
@@ -66,7 +68,9 @@ TemplateLines templateLines(std::string_view masterTemplate) {
 
 /// Names the key among the lost ones, or takes it from there: its last line counts.
 void note(std::vector<std::string> &keys, const std::string &key, bool isLost) {
-    std::erase(keys, key);
+    std::erase_if(keys, [&key](const std::string &other) {
+        return compareNoCase(other.c_str(), key.c_str()) == 0;
+    });
     if (isLost && keys.size() < LostSettings::maximumNamed) {
         keys.push_back(key);
     }
@@ -80,6 +84,7 @@ public:
 
     void begin(std::string_view key) {
         end();
+        isCut_ = false;
         key_ = key;
         value_.clear();
     }
@@ -91,6 +96,9 @@ public:
         }
         value_ += text;
     }
+
+    /// Of a line of the setting, what stands behind its text.
+    void drop(std::string_view rest) { isCut_ = isCut_ || (rest != "\n" && holdsWord(rest)); }
 
     void end() const {
         if (key_.empty()) {
@@ -104,8 +112,9 @@ public:
         const auto line = template_.find(key_);
         const bool isKept = line != template_.end() &&
                             (setting != nullptr ? line->second.hasColon
-                                                : trimmed(line->second.value) == trimmed(value_));
-        note(lostSettings.keys, key_, !isKept);
+                                                : withoutBlanksAndCommas(line->second.value) ==
+                                                      withoutBlanksAndCommas(value_));
+        note(lostSettings.keys, key_, !isKept || isCut_);
         note(lostSettings.accessLists, key_,
              isKept && dynamic_cast<AccessListSetting *>(setting) != nullptr &&
                  !isKeptWhole(value_));
@@ -113,6 +122,7 @@ public:
 
 private:
     TemplateLines template_;
+    bool isCut_ = false;
     std::string key_;
     std::string value_;
 };
@@ -160,6 +170,7 @@ void parseMasterConfig(std::string_view bytes, std::string_view masterTemplate) 
     LinePieces lines{bytes};
     while (const std::optional<std::string_view> line = lines.next()) {
         std::string_view text = lineText(*line);
+        const std::string_view rest = line->substr(text.size());
         const bool isEmptyLine = line->front() == '\r' || line->front() == '\n';
         if (isEmptyLine || line->front() == commentMark) {
             continue;
@@ -170,6 +181,7 @@ void parseMasterConfig(std::string_view bytes, std::string_view masterTemplate) 
             text = keyLine.value;
         }
         setting.add(text);
+        setting.drop(rest);
     }
     setting.end();
 }

@@ -1,6 +1,7 @@
 #include "fetch/pophosts.h"
 
 #include "base/byteset.h"
+#include "base/lines.h"
 
 #include <algorithm>
 #include <new>
@@ -75,8 +76,9 @@ std::size_t parsePopHosts(TextOrNone text) {
             }
             const bool isWhole = isRead && (rest.empty() || betweenEntries.holds(rest.front()));
             if (!isWhole && entry.size() <= leftToCount) {
-                ++unread;
-                leftToCount = entry.size() - betweenEntries.spanBefore(entry);
+                const std::size_t size = betweenEntries.spanBefore(entry);
+                unread += holdsWord(entry.substr(0, size)) ? 1 : 0;
+                leftToCount = entry.size() - size;
             }
         }
     } catch (const std::bad_alloc &) {

@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cstdlib>
 
 RecordChain<maillist_entry> maillist_list;
 ProductFile mailListFile;
@@ -63,8 +64,16 @@ AddressChain *sectionOpened(maillist_entry &list, std::string_view startLine) {
     return nullptr;
 }
 
-std::string_view behindNumber(std::string_view text) {
-    return text.substr(std::min(text.find_first_not_of(" \t+-0123456789"), text.size()));
+/// Sets the number that the value gives. Gives back what stands behind it; all of the value where
+/// it takes the place of another number.
+template <class Number>
+std::string_view setNumber(Number &number, std::string_view value) {
+    const std::string digits{value};
+    char *end = nullptr;
+    std::strtoll(digits.c_str(), &end, 10);
+    const Number before = std::exchange(number, static_cast<Number>(parseInteger(value)));
+    const bool isOther = before != 0 && before != number;
+    return isOther ? value : value.substr(static_cast<std::size_t>(end - digits.c_str()));
 }
 
 /// Sets the field that the line gives. Gives back what of the line is in no record; all of it where
@@ -78,13 +87,11 @@ std::string_view setField(maillist_entry &list, KeptText line) {
     }
     for (const auto &[key, field] : numberKeys) {
         if (line.starts_with(key)) {
-            list.*field = parseInteger(line.substr(key.size()));
-            return behindNumber(line.substr(key.size()));
+            return setNumber(list.*field, line.substr(key.size()));
         }
     }
     if (line.starts_with(flagsKey)) {
-        list.flags = static_cast<std::uint32_t>(parseInteger(line.substr(flagsKey.size())));
-        return behindNumber(line.substr(flagsKey.size()));
+        return setNumber(list.flags, line.substr(flagsKey.size()));
     }
     return line;
 }

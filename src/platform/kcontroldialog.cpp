@@ -48,6 +48,7 @@ void KControlDialog::setNote(const QString &text, const QString &tip) {
     note_->setText(text);
     // What could be taken for markup is none, and so the tip has lines of its own.
     note_->setToolTip(tip == text ? QString{} : "<qt>" + tip.toHtmlEscaped() + "</qt>");
+    note_->setAccessibleDescription(tip == text ? QString{} : tip);
     note_->setVisible(!text.isEmpty());
     if (isVisible()) {
         fitToScreen();

@@ -48,8 +48,9 @@ void prepareProcess() {
         }
     }
     exchange(writeSignals);
-    isBusHidden = ::geteuid() == 0 && std::getenv(busVariable) == nullptr &&
-                  ::setenv(busVariable, "disabled:", 0) == 0;
+    const char *bus = std::getenv(busVariable);
+    isBusHidden = ::geteuid() == 0 && (bus == nullptr || *bus == '\0') &&
+                  ::setenv(busVariable, "disabled:", 1) == 0;
 }
 
 pid_t EndSignalsHeld::startShellCommand(const char *command) {
