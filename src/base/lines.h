@@ -68,10 +68,13 @@ inline bool holdsWord(std::string_view bytes) {
 }
 
 /// What stands behind the first word, with nothing but white space before it.
-inline std::string_view behindWord(std::string_view bytes) {
+template <class Text>
+Text behindWord(Text piece) {
+    const std::string_view bytes = piece;
     const auto isSpace = [](unsigned char byte) { return std::isspace(byte) != 0; };
     const auto word = std::ranges::find_if_not(bytes, isSpace);
-    return {std::find_if(word, bytes.end(), isSpace), bytes.end()};
+    const auto end = std::find_if(word, bytes.end(), isSpace);
+    return piece.substr(static_cast<std::size_t>(end - bytes.begin()));
 }
 
 /// Counts the lines of a file of which something is in no record. A line that is read in several

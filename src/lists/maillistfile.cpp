@@ -67,8 +67,8 @@ AddressChain *sectionOpened(maillist_entry &list, std::string_view startLine) {
 /// Sets the number that the value gives. Gives back what stands behind it; all of the value where
 /// it takes the place of another number.
 template <class Number>
-std::string_view setNumber(Number &number, std::string_view value) {
-    const std::string digits{value};
+KeptText setNumber(Number &number, KeptText value) {
+    const std::string digits{std::string_view{value}};
     char *end = nullptr;
     std::strtoll(digits.c_str(), &end, 10);
     const Number before = std::exchange(number, static_cast<Number>(parseInteger(value)));
@@ -78,11 +78,12 @@ std::string_view setNumber(Number &number, std::string_view value) {
 
 /// Sets the field that the line gives. Gives back what of the line is in no record; all of it where
 /// it takes the place of another.
-std::string_view setField(maillist_entry &list, KeptText line) {
+KeptText setField(maillist_entry &list, KeptText line) {
     for (const auto &[key, field] : textKeys) {
         if (line.starts_with(key)) {
-            const std::string_view before = std::exchange(list.*field, line.substr(key.size()));
-            return before == list.*field || !holdsWord(before) ? std::string_view{} : line;
+            const KeptText before = std::exchange(list.*field, line.substr(key.size()));
+            const bool isOther = std::string_view{before} != list.*field && holdsWord(before);
+            return isOther ? line : KeptText{};
         }
     }
     for (const auto &[key, field] : numberKeys) {
@@ -102,13 +103,13 @@ public:
     explicit BlockReader(RecordChain<maillist_entry> &lists) : lists_{lists} {}
 
     /// Gives back what of the piece is in no record.
-    std::string_view take(KeptText piece) {
+    KeptText take(KeptText piece) {
         if (section_ != nullptr) {
             return takeAddress(piece);
         }
         if (list_ != nullptr) {
             const KeptText line = lineText(piece);
-            const std::string_view lost = takeLine(line);
+            const KeptText lost = takeLine(line);
             return holdsWord(lost) ? lost : piece.substr(line.size());
         }
         if (piece.starts_with("#new")) {
@@ -119,7 +120,7 @@ public:
     }
 
 private:
-    std::string_view takeAddress(KeptText piece) {
+    KeptText takeAddress(KeptText piece) {
         if (piece.starts_with('#')) {
             section_ = nullptr;
             return piece.starts_with("#end") ? behindWord(piece) : piece;
@@ -129,7 +130,7 @@ private:
         return piece.substr(line.size());
     }
 
-    std::string_view takeLine(KeptText line) {
+    KeptText takeLine(KeptText line) {
         if (line.starts_with("#endlist")) {
             list_ = nullptr;
             return behindWord(line);
