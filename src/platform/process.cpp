@@ -13,7 +13,24 @@ namespace {
 
 std::atomic<unsigned> arrived{0}; ///< A bit for each signal that waits.
 
-void hold(int signal) { arrived |= 1U << signal; }
+std::atomic<bool> areHeld{false};
+
+void raiseArrived() {
+    const unsigned waiting = arrived.exchange(0);
+    for (const int signal : {SIGTERM, SIGINT, SIGHUP}) {
+        if ((waiting & 1U << signal) != 0) {
+            [[maybe_unused]] const int result = std::raise(signal);
+        }
+    }
+}
+
+/// May run in another thread of the toolkit, and still do so when the main thread holds no more.
+void hold(int signal) {
+    arrived |= 1U << signal;
+    if (!areHeld) {
+        raiseArrived();
+    }
+}
 
 constexpr const char *busVariable = "DBUS_SESSION_BUS_ADDRESS";
 bool isBusHidden = false;
@@ -72,14 +89,13 @@ void waitForCommand(pid_t command) {
     }
 }
 
-EndSignalsHeld::EndSignalsHeld() { exchange(endSignals); }
+EndSignalsHeld::EndSignalsHeld() {
+    areHeld = true;
+    exchange(endSignals);
+}
 
 EndSignalsHeld::~EndSignalsHeld() {
     exchange(endSignals);
-    const unsigned waiting = arrived.exchange(0);
-    for (const auto &[signal, other] : endSignals) {
-        if ((waiting & 1U << signal) != 0) {
-            [[maybe_unused]] const int result = std::raise(signal);
-        }
-    }
+    areHeld = false;
+    raiseArrived();
 }
