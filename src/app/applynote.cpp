@@ -4,16 +4,14 @@
 #include "config/masterfile.h"
 #include "lists/maillistfile.h"
 #include "platform/bytetext.h"
-#include "platform/kapplication.h"
 #include "server/smtprejectfile.h"
+#include "widgets/captions.h"
 
 #include <QStringList>
 
 #include <algorithm>
 
 namespace {
-
-QString shown(TranslatableText text) { return KApplication::getLocale()->translate(text); }
 
 /// The keys, each in its place in the text; "..." stands for those beyond the maximum.
 QStringList named(const std::vector<std::string> &keys, std::size_t maximum,
@@ -35,14 +33,14 @@ struct Note {
 bool isSaved(Note &note, const std::optional<TranslatableText> &obstacle,
              TranslatableText unsaved) {
     if (obstacle) {
-        note.sentences << shown(unsaved).arg(shown(*obstacle));
+        note.sentences << translated(unsaved).arg(translated(*obstacle));
     }
     return !obstacle;
 }
 
 void addCount(Note &note, std::size_t count, TranslatableText what) {
     if (count > 0) {
-        note.dropped << shown(what).arg(count);
+        note.dropped << translated(what).arg(count);
     }
 }
 
@@ -60,10 +58,10 @@ QString applyNote(std::size_t maximumNames) {
     if (isSaved(note, masterFileObstacle(), translatable("Settings will not be saved: %1."))) {
         const auto &[keys, accessLists, fetchers] = lostSettings;
         if (!keys.empty()) {
-            note.dropped << shown(translatable("settings that cannot be kept (%1)"))
+            note.dropped << translated(translatable("settings that cannot be kept (%1)"))
                                 .arg(named(keys, maximumNames).join(", "));
         }
-        note.dropped << named(accessLists, maximumNames, shown(translatable("items of %1")));
+        note.dropped << named(accessLists, maximumNames, translated(translatable("items of %1")));
         addCount(note, fetchers, translatable("fetchers that cannot be read (%1)"));
     }
     addFile(note, aliasFile, translatable("Aliases will not be saved: %1."),
@@ -74,7 +72,7 @@ QString applyNote(std::size_t maximumNames) {
             translatable("lines of the mailing-list file (%1)"));
     if (!note.dropped.isEmpty()) {
         note.sentences
-            << shown(translatable("An apply will drop: %1.")).arg(note.dropped.join(", "));
+            << translated(translatable("An apply will drop: %1.")).arg(note.dropped.join(", "));
     }
     return note.sentences.join(' ');
 }

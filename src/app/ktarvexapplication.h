@@ -17,6 +17,7 @@ public:
 
 private:
     void showNote();
+
     // In the order of the tabs. Null until created, and for good when the command line names other
     // pages. The dialog owns them.
     std::array<KConfigWidget *, 7> pages_{};

@@ -20,8 +20,8 @@ public:
     int read(const Path &path, const std::function<void(std::string bytes)> &take);
 
     /// Rewrites the file that was read with what `format` appends, all of which is in memory before
-    /// the file is touched. Whether that was done: nothing happens when there is no path, or memory
-    /// runs out.
+    /// the file is touched. Whether it was written whole; it is not touched where there is no path
+    /// or the file is not this program's to write, or when memory runs out.
     bool rewrite(const std::function<void(std::string &bytes)> &format, mode_t newFileMode = 0666);
 
     /// Why the file will not be rewritten, as far as that is known; none where it will be.

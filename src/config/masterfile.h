@@ -22,8 +22,7 @@ struct LostSettings {
     static constexpr std::size_t maximumNamed = 21;
     std::vector<std::string> keys; ///< The template names them not, or gives them another value.
     std::vector<std::string> accessLists; ///< These lose items, or have some widened or narrowed.
-    std::size_t fetchers =
-        0; ///< Entries of pop.hosts that cannot be read; whoever reads it counts.
+    std::size_t fetchers = 0; ///< Entries that cannot be read. Who parses them counts them.
 };
 
 /// As the file was read or rewritten last.
