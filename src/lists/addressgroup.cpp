@@ -5,6 +5,7 @@
 namespace {
 
 constexpr int buttonWidth = 60;
+constexpr int buttonHeight = 22;
 constexpr QSize minimumBox{120, 40};
 
 maillist_addr_entry copyOf(const maillist_addr_entry &entry) { return {entry.addr}; }
@@ -12,7 +13,7 @@ maillist_addr_entry copyOf(const maillist_addr_entry &entry) { return {entry.add
 } // namespace
 
 AddressGroup::AddressGroup(const Kind &kind, EditList *editor, const maillist_entry &list)
-    : ListGroup(kind.caption, {.box = 1000, .column = 0}, editor, Shrinking::Yes),
+    : ListGroup(kind.caption, {.box = 1000, .column = 0}, editor),
       chain_{(list.*kind.chain).copied(copyOf)} {
     box()->setMinimumSize(minimumBox);
     // The box takes what height there is; only the buttons beside it ask for some.
@@ -22,5 +23,8 @@ AddressGroup::AddressGroup(const Kind &kind, EditList *editor, const maillist_en
     connect(addButton("Search..."), &QPushButton::clicked, editor, kind.search);
     connect(addButton("Load File"), &QPushButton::clicked, editor, kind.load);
     fixColumnWidth(buttonWidth);
+    for (QPushButton *button : findChildren<QPushButton *>()) {
+        fixHeight(button, buttonHeight);
+    }
     column()->addStretch();
 }

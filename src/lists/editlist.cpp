@@ -14,10 +14,6 @@ namespace {
 constexpr int browseWidth = 60;
 constexpr int unitHeight = 20;
 constexpr int checkBoxHeight = 20;
-/// What rows keep beside their text's height, in pixels, in a window that is too low for all.
-constexpr int fieldPadding = 4;
-constexpr int numberPadding = 6;
-constexpr int checkBoxPadding = 1;
 constexpr QSize minimumWindow{600, 350};
 
 struct TextRow {
@@ -107,40 +103,22 @@ maillist_entry newList() {
     return list;
 }
 
-/// A row of its own below those that are there already.
-QHBoxLayout *newRow(QVBoxLayout *rows) {
-    if (rows->count() > 0) {
-        addSpace(rows, groupSpacing, Shrinking::Yes);
-    }
-    auto *row = new QHBoxLayout;
-    row->setSpacing(groupSpacing);
-    rows->addLayout(row);
-    return row;
-}
-
-template <class Widgets>
-QVBoxLayout *newSide(const Widgets &widgets) {
-    auto *side = new QVBoxLayout;
-    side->setSpacing(0);
-    for (QWidget *widget : widgets) {
-        if (side->count() > 0) {
-            addSpace(side, groupSpacing, Shrinking::Yes);
-        }
-        side->addWidget(widget);
-    }
-    return side;
-}
-
 } // namespace
 
 EditList::EditList(QWidget *parent, const char *name, const maillist_entry *list)
-    : FormDialog(parent, name, "Mailing List", fieldPadding) {
+    : FormDialog(parent, name, "Mailing List") {
     const maillist_entry standard = newList();
     const maillist_entry &shown = list != nullptr ? *list : standard;
-    QVBoxLayout *left = newSide(std::array{newTexts(shown), newOptions(shown)});
+    auto *left = new QVBoxLayout;
+    left->setSpacing(groupSpacing);
+    left->addWidget(newTexts(shown));
+    left->addWidget(newOptions(shown));
     left->addStretch();
+    auto *right = new QVBoxLayout;
+    right->setSpacing(groupSpacing);
     for (std::size_t index = 0; index < addressKinds.size(); ++index) {
         groups_.at(index) = new AddressGroup(addressKinds.at(index), this, shown);
+        right->addWidget(groups_.at(index));
     }
 
     auto *columns = new QWidget(this);
@@ -148,20 +126,19 @@ EditList::EditList(QWidget *parent, const char *name, const maillist_entry *list
     sides->setContentsMargins(0, 0, 0, 0);
     sides->setSpacing(groupSpacing);
     sides->addLayout(left, 150);
-    sides->addLayout(newSide(groups_), 300);
+    sides->addLayout(right, 300);
     rows()->addWidget(columns);
-    addButtons(pageBorder, pageBorder, Shrinking::Yes);
+    addButtons(pageBorder, pageBorder, pageBorder);
     const QSize available = availableSize(this);
-    if (!fitsInto(available, layout()->totalMinimumSize())) {
-        rows()->addWidget(scrolling(columns));
-    }
-    setMinimumSize(minimumWindow.expandedTo(layout()->totalMinimumSize()).boundedTo(available));
-    resize(layout()->totalSizeHint().boundedTo(available));
+    const QSize wanted = layout()->totalSizeHint(); // An area that scrolls asks for less.
+    rows()->addWidget(scrolling(columns));
+    setMinimumSize(minimumWindow.boundedTo(available));
+    resize(wanted.boundedTo(available));
 }
 
 QGroupBox *EditList::newTexts(const maillist_entry &list) {
     auto *group = new QGroupBox(QStringLiteral("List Addresses"), this);
-    QVBoxLayout *rows = newGroupRows(group, Shrinking::Yes);
+    QVBoxLayout *rows = newGroupRows(group);
     CaptionColumn addressCaptions{{110, 0}};
     for (const auto &[caption, field] : addressRows) {
         addText(newRow(rows), caption, addressCaptions, field, list);
@@ -189,11 +166,12 @@ TextField *EditList::addText(QHBoxLayout *row, TranslatableText caption, Caption
 
 QGroupBox *EditList::newOptions(const maillist_entry &list) {
     auto *group = new QGroupBox(QStringLiteral("Posting Options"), this);
-    QVBoxLayout *rows = newGroupRows(group, Shrinking::Yes);
+    QVBoxLayout *rows = newGroupRows(group);
     for (const auto &[caption, bit] : options) {
         auto *box = new QCheckBox(QString::fromUtf8(caption), group);
         box->setChecked((list.flags & bit) != 0);
-        addOfHeight(newRow(rows), box, checkBoxHeight, checkBoxPadding);
+        fixHeight(box, checkBoxHeight);
+        rows->addWidget(box);
         stores_.emplace_back([box, bit = bit](maillist_fields &fields) {
             fields.flags = box->isChecked() ? fields.flags | bit : fields.flags & ~bit;
         });
@@ -202,12 +180,10 @@ QGroupBox *EditList::newOptions(const maillist_entry &list) {
     for (const auto &[caption, unit, unitWidth, field] : triggers) {
         KNumericSpinBox *box = newNumberField(this, 0, maximumTrigger, list.*field);
         QHBoxLayout *row = newRow(rows);
-        // With an alignment the labels' fixed height does not hold the row's down.
-        row->addWidget(captions.newCaption(QString::fromUtf8(caption), box), 0, Qt::AlignVCenter);
-        addOfHeight(row, box, fieldHeight, numberPadding);
-        QLabel *unitLabel = newLabel(QString::fromUtf8(unit), {unitWidth, unitHeight}, this);
-        unitLabel->setBuddy(box);
-        row->addWidget(unitLabel, 0, Qt::AlignVCenter);
+        row->addWidget(captions.newCaption(QString::fromUtf8(caption), box));
+        addAsField(row, box);
+        row->addWidget(
+            CaptionColumn{{unitWidth, unitHeight}}.newCaption(QString::fromUtf8(unit), box));
         row->addStretch();
         stores_.emplace_back(
             [box, field = field](maillist_fields &fields) { fields.*field = box->getValue(); });

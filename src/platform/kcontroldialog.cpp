@@ -114,9 +114,10 @@ void KControlDialog::fitToScreen() {
     // The layout would take the note's height from the pages'.
     const QMargins margins = layout_->contentsMargins();
     const int width = layout_->totalMinimumSize().width() - margins.left() - margins.right();
-    note_->setMinimumHeight(note_->heightForWidth(width));
+    note_->setMinimumHeight(note_->isHidden() ? 0 : note_->heightForWidth(width));
     const QSize available = availableSize(this);
-    if (tabs_->usesScrollButtons() || fitsInto(available, layout_->totalMinimumSize())) {
+    const QSize needed = layout_->totalMinimumSize();
+    if (tabs_->usesScrollButtons() || needed.boundedTo(available) == needed) {
         return;
     }
     tabs_->setUsesScrollButtons(true);

@@ -9,9 +9,5 @@ class QWidget;
 /// window manager's frame, as far as that is known before the window is shown.
 QSize availableSize(const QWidget *window);
 
-inline bool fitsInto(QSize available, QSize window) {
-    return window.boundedTo(available) == window;
-}
-
 /// A frameless area of the content's own size in which it scrolls where it is given less.
 QScrollArea *scrolling(QWidget *content);

@@ -16,12 +16,6 @@ QString plainName(QString caption) {
     return caption.trimmed();
 }
 
-QLabel *newLabel(const QString &caption, QSize minimum, QWidget *parent) {
-    auto *label = new QLabel(caption, parent);
-    label->setFixedSize(minimumSizeFor(label, minimum));
-    return label;
-}
-
 QLabel *CaptionColumn::newCaption(const QString &caption, QWidget *field) {
     auto *label = new QLabel(caption, field->parentWidget());
     label->setBuddy(field);

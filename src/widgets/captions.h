@@ -15,9 +15,6 @@ QString translated(TranslatableText caption);
 /// What a caption calls its field: without "&", and without ":" or "..." at its end.
 QString plainName(QString caption);
 
-/// A label of at least that size in which the whole caption is seen.
-QLabel *newLabel(const QString &caption, QSize minimum, QWidget *parent);
-
 /// The captions of one form's fields. All are as wide as the widest of them needs, so that the
 /// fields beside them begin at one x.
 class CaptionColumn {

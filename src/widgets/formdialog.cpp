@@ -39,10 +39,8 @@ void browse(TextField *field, QFileDialog &chooser) {
 
 } // namespace
 
-FormDialog::FormDialog(QWidget *parent, const char *name, const char *caption,
-                       std::optional<int> fieldPadding)
+FormDialog::FormDialog(QWidget *parent, const char *name, const char *caption)
     : QDialog(parent),
-      fieldPadding_{fieldPadding},
       panel_{new QFrame(this)},
       layout_{new QVBoxLayout(this)},
       rows_{new QVBoxLayout},
@@ -53,17 +51,9 @@ FormDialog::FormDialog(QWidget *parent, const char *name, const char *caption,
     addHelpKey(this);
     panel_->setFrameStyle(static_cast<int>(QFrame::WinPanel) | static_cast<int>(QFrame::Raised));
     panel_->setLineWidth(1);
-    layout_->setContentsMargins(pageBorder, 0, pageBorder, 0);
     layout_->setSpacing(0);
     rows_->setSpacing(groupSpacing);
     buttons_->setSpacing(groupSpacing);
-}
-
-QHBoxLayout *FormDialog::addRow() {
-    auto *row = new QHBoxLayout;
-    row->setSpacing(groupSpacing);
-    rows_->addLayout(row);
-    return row;
 }
 
 TextField *FormDialog::addField(TranslatableText caption, QSize label, std::string_view bytes) {
@@ -87,22 +77,21 @@ QPushButton *FormDialog::addBrowseButton(QHBoxLayout *row, int width, Translatab
     auto *button = new QPushButton(QStringLiteral("Browse..."), this);
     button->setAccessibleName(plainName(translated(caption)) + ": " + button->text());
     button->setFixedWidth(minimumSizeFor(button, {width, fieldHeight}).width());
-    addOfHeight(row, button, field->maximumHeight(), fieldPadding_);
+    fixHeight(button, field->maximumHeight());
+    row->addWidget(button);
     return button;
 }
 
 void FormDialog::addAsField(QHBoxLayout *row, QWidget *widget) {
-    addOfHeight(row, widget, fieldHeight, fieldPadding_);
+    fixHeight(widget, fieldHeight);
+    row->addWidget(widget);
 }
 
-void FormDialog::addButtons(int aboveRows, int aboveButtons, Shrinking shrinking) {
-    addSpace(layout_, aboveRows, shrinking);
+void FormDialog::addButtons(int aboveRows, int aboveButtons, int belowButtons) {
+    layout_->setContentsMargins(pageBorder, aboveRows, pageBorder, belowButtons);
     layout_->addLayout(rows_);
-    addSpace(layout_, aboveButtons, shrinking);
+    layout_->addSpacing(aboveButtons);
     layout_->addLayout(buttons_);
-    if (shrinking == Shrinking::Yes) {
-        addSpace(layout_, pageBorder, shrinking);
-    }
     buttons_->addStretch();
     for (const auto &[caption, slot] :
          {std::pair{"OK", &QDialog::accept}, std::pair{"Cancel", &QDialog::reject}}) {

@@ -22,13 +22,11 @@ public:
     static constexpr int fieldHeight = 25;
 
 protected:
-    /// With `fieldPadding` the fields may shrink; see addOfHeight.
-    FormDialog(QWidget *parent, const char *name, const char *caption,
-               std::optional<int> fieldPadding = std::nullopt);
+    FormDialog(QWidget *parent, const char *name, const char *caption);
 
     /// The rows on the panel, from top to bottom.
     [[nodiscard]] QVBoxLayout *rows() const { return rows_; }
-    QHBoxLayout *addRow();
+    QHBoxLayout *addRow() { return newRow(rows_); }
 
     /// A row of a label and a line edit showing `bytes`; the label is the edit's buddy. `label` is
     /// the label's minimum size.
@@ -43,8 +41,8 @@ protected:
     void addAsField(QHBoxLayout *row, QWidget *widget);
 
     /// To be called when all rows are there, so that the buttons come last with Tab as well. The
-    /// numbers are the pixels above the rows and between rows and buttons.
-    void addButtons(int aboveRows, int aboveButtons, Shrinking shrinking = Shrinking::No);
+    /// numbers are pixels; `aboveButtons` is what lies between rows and buttons.
+    void addButtons(int aboveRows, int aboveButtons, int belowButtons = 0);
 
     /// Fixes the dialog's size and with it the panel's; both grow by what a larger font needs
     /// more. Where the panel would reach into the button row, it ends above it.
@@ -55,7 +53,6 @@ protected:
     void resizeEvent(QResizeEvent *event) override;
 
 private:
-    std::optional<int> fieldPadding_;
     std::vector<TextField *> fields_;
     QFrame *panel_;
     QVBoxLayout *layout_;

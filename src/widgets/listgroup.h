@@ -17,8 +17,7 @@ public:
         int column;
     };
 
-    ListGroup(const char *caption, Stretch stretch, QWidget *parent,
-              Shrinking shrinking = Shrinking::No);
+    ListGroup(const char *caption, Stretch stretch, QWidget *parent);
 
     [[nodiscard]] QListBox *box() const { return box_; }
     /// For what stands below the buttons.
@@ -44,5 +43,4 @@ public:
 private:
     QListBox *box_;
     QVBoxLayout *column_;
-    Shrinking shrinking_;
 };

@@ -13,14 +13,14 @@ SettingsForm::SettingsForm(QWidget *page, int labelWidth)
 
 void SettingsForm::group(const char *caption) {
     group_ = new QGroupBox(QString::fromUtf8(caption), pageLayout_->parentWidget());
-    groupLayout_ = newGroupRows(group_);
+    groupRows_ = newGroupRows(group_);
     pageLayout_->addWidget(group_);
 }
 
 void SettingsForm::checkBox(const char *caption, BoolSetting &setting) {
     auto *box = new QCheckBox(QString::fromUtf8(caption), group_);
     box->setChecked(setting.value != 0);
-    QHBoxLayout *row = newRow();
+    QHBoxLayout *row = newRow(groupRows_);
     row->addWidget(box);
     row->addStretch();
     stores_.emplace_back([box, &setting] { setting.value = box->isChecked() ? 1 : 0; });
@@ -29,7 +29,7 @@ void SettingsForm::checkBox(const char *caption, BoolSetting &setting) {
 void SettingsForm::number(const char *caption, int minimum, int maximum, NumberSetting &setting,
                           const char *note) {
     KNumericSpinBox *box = newNumberField(group_, minimum, maximum, setting.value);
-    QHBoxLayout *row = newRow(caption, box);
+    QHBoxLayout *row = addField(caption, box);
     if (note != nullptr) {
         auto *label = new QLabel(QString::fromUtf8(note), group_);
         label->setBuddy(box);
@@ -72,15 +72,8 @@ void SettingsForm::store() const {
     }
 }
 
-QHBoxLayout *SettingsForm::newRow() {
-    auto *row = new QHBoxLayout;
-    row->setSpacing(groupSpacing);
-    groupLayout_->addLayout(row);
-    return row;
-}
-
-QHBoxLayout *SettingsForm::newRow(const char *caption, QWidget *field) {
-    QHBoxLayout *row = newRow();
+QHBoxLayout *SettingsForm::addField(const char *caption, QWidget *field) {
+    QHBoxLayout *row = newRow(groupRows_);
     row->addWidget(captions_.newCaption(QString::fromUtf8(caption), field));
     row->addWidget(field);
     return row;
@@ -89,6 +82,6 @@ QHBoxLayout *SettingsForm::newRow(const char *caption, QWidget *field) {
 TextField *SettingsForm::newTextField(const char *caption, std::string_view bytes) {
     TextField *field = new TextField(group_);
     field->showBytes(bytes);
-    newRow(caption, field);
+    addField(caption, field);
     return field;
 }

@@ -38,12 +38,11 @@ public:
     void store() const;
 
 private:
-    QHBoxLayout *newRow();
-    QHBoxLayout *newRow(const char *caption, QWidget *field);
+    QHBoxLayout *addField(const char *caption, QWidget *field);
     TextField *newTextField(const char *caption, std::string_view bytes);
 
     QVBoxLayout *pageLayout_;
-    QVBoxLayout *groupLayout_ = nullptr;
+    QVBoxLayout *groupRows_ = nullptr;
     QGroupBox *group_ = nullptr;
     CaptionColumn captions_;
     std::vector<std::function<void()>> stores_;
