@@ -118,7 +118,7 @@ private slots:
     void memberTakesALineOfTheFile() {
         using Case = std::tuple<std::size_t, std::size_t, bool, std::size_t>;
         for (const auto &[stored, text, isOnDigest, taken] :
-             {Case{0, 249, false, 248}, Case{0, 247, true, 248}, Case{0, 248, true, 0},
+             {Case{0, 248, false, 248}, Case{0, 247, true, 248}, Case{0, 248, true, 0},
               Case{249, 248, true, 249}}) {
             const maillist_addr_entry entry{keep(std::string(stored, ':'))};
             EditListMember dialog{nullptr, "edit", &entry};

@@ -9,8 +9,8 @@ namespace {
 FieldRule ruleFor(std::size_t size, TranslatableText toolTip) {
     const std::size_t maximum = size - 1;
     return {.refused = QStringLiteral(":@,"),
-            .maximumBytes = maximum,
-            .toolTip = translated(toolTip).arg(maximum)};
+            .toolTip = translated(toolTip).arg(maximum),
+            .maximumBytes = maximum};
 }
 
 } // namespace

@@ -32,72 +32,43 @@ public:
     void setShown(const QString &text) { shown_ = text; }
     void setRule(const FieldRule &rule) { rule_ = rule; }
 
-    State validate(QString &input, int &position) const override {
-        refusal_ = rule_.toolTip;
+    State validate(QString &input, int & /*position*/) const override {
         const QString first = input.left(1);
         if ((!first.isEmpty() && first != shown_.left(1) && rule_.refusedFirst.contains(first)) ||
             std::ranges::any_of(input, [this](QChar character) {
                 return rule_.refused.contains(character) && !shown_.contains(character);
             })) {
+            refusal_ = rule_.toolTip;
             return Invalid;
         }
-        if (rule_.maximumBytes > 0) {
-            cutToFit(input, position);
-        }
-        if (isTooLong(input)) {
-            refusal_ = lengthRule(maximumBytes).toolTip;
-            return Invalid;
-        }
-        return Acceptable;
+        const std::size_t maximum = std::max(rule_.maximumBytes, byteCount(shown_));
+        refusal_ = lengthRule(maximum).toolTip;
+        return byteCount(input) > maximum ? Invalid : Acceptable;
     }
 
     /// Why the last text was refused that was.
     [[nodiscard]] const QString &refusal() const { return refusal_; }
 
 private:
-    /// The bytes are counted only where there may be too many: no character has more than four,
-    /// and those of four count as two.
-    static bool isTooLong(const QString &input) {
-        return 3 * static_cast<std::size_t>(input.size()) > maximumBytes &&
-               byteCount(input) > maximumBytes;
-    }
-
-    /// What was put in ends at `position`: there it is cut, so that nothing that stood in the field
-    /// before is pushed out. What was shown longer may be edited, but not grow.
-    void cutToFit(QString &input, int &position) const {
-        const std::size_t maximum = std::max(rule_.maximumBytes, byteCount(shown_));
-        std::size_t count = byteCount(input);
-        int kept = position;
-        while (count > maximum && kept > 0) {
-            const bool isPair = kept > 1 && input.at(kept - 1).isLowSurrogate() &&
-                                input.at(kept - 2).isHighSurrogate();
-            const int length = isPair ? 2 : 1;
-            kept -= length;
-            count -= byteCount(QStringView{input}.mid(kept, length));
-        }
-        input.remove(kept, position - kept);
-        position = kept;
-    }
-
     FieldRule rule_;
     QString shown_; ///< By the program; what it holds may stay.
     mutable QString refusal_;
 };
 
 FieldRule lengthRule(std::size_t maximumBytes) {
-    return {.maximumBytes = maximumBytes,
-            .toolTip = translated(translatable("At most %1 bytes")).arg(maximumBytes)};
+    return {.toolTip = translated(translatable("At most %1 bytes")).arg(maximumBytes),
+            .maximumBytes = maximumBytes};
 }
 
 TextField::TextField(QWidget *parent) : QLineEdit(parent), validator_{new Validator(this)} {
     // The edit cuts beyond this, which the rule then refuses: every character is a byte or more.
-    setMaxLength(static_cast<int>(maximumBytes) + 1);
+    setMaxLength(static_cast<int>(FieldRule::longestEditable) + 1);
     setValidator(validator_);
     connect(this, &QLineEdit::inputRejected, this, [this] { showTip(validator_->refusal()); });
 }
 
 void TextField::showBytes(std::string_view bytes) {
-    const bool isTooLong = bytes.size() > maximumBytes;
+    const bool isTooLong = bytes.size() > FieldRule::longestEditable;
     const QString shown =
         textFromBytes(bytes.substr(0, isTooLong ? bytesShownOfLonger : bytes.size()));
     validator_->setShown(shown);
@@ -134,29 +105,19 @@ KeptText TextField::keptText(KeptText before) const {
     return typed == std::string_view{before} ? before : keep(typed);
 }
 
-bool TextField::holdsRefusedText() {
-    QString accepted = text();
-    int position = static_cast<int>(accepted.size());
-    if (showsPartOnly() || (validator_->validate(accepted, position) == QValidator::Acceptable &&
-                            accepted == text())) {
-        return false;
+void TextField::replaceText(const QString &text) {
+    if (takes(text) && !showsPartOnly()) {
+        setText(text);
     }
-    showTip(validator_->refusal());
-    return true;
 }
 
-void TextField::replaceText(const QString &text) {
-    if (showsPartOnly()) {
-        return;
+bool TextField::takes(QString text) const {
+    int position = 0;
+    if (showsPartOnly() || validator_->validate(text, position) == QValidator::Acceptable) {
+        return true;
     }
-    const QString before = this->text();
-    setText(text);
-    if (this->text() != text) { // It was cut, and would lead elsewhere.
-        showTip(validator_->refusal());
-    } else if (!holdsRefusedText()) {
-        return;
-    }
-    setText(before);
+    showTip(validator_->refusal());
+    return false;
 }
 
 void TextField::showTip(const QString &tip) const {

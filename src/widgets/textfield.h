@@ -12,31 +12,30 @@
 /// program shows stays as it is, whatever the rule, and what it holds against the rule may stay in
 /// what is typed.
 struct FieldRule {
+    /// Beyond this a line edit takes too long for a keystroke.
+    static constexpr std::size_t longestEditable = 100'000;
+
+
     QString refused{};            ///< Characters that the text must not hold.
     QString refusedFirst{};       ///< Characters that it must not begin with.
-    std::size_t maximumBytes = 0; ///< Longer input is cut between two characters; 0 for no limit.
-    QString toolTip;              ///< Says so; it appears at the field when input is refused.
+    QString toolTip{};            ///< Says so; it appears at the field when they are typed.
+    std::size_t maximumBytes = longestEditable; ///< Or as many as the text had that was shown.
 };
 
 /// A rule for a text of at most `maximumBytes`, and nothing else.
 FieldRule lengthRule(std::size_t maximumBytes);
 
 /// A line edit for bytes: the only way of a text into a record or a setting. What the user types or
-/// pastes against its rule it refuses, and says why beside its window: a tool tip below the field
-/// would cover the next one and take its click. Without a rule it refuses only what would take its
-/// text beyond `maximumBytes`, whole; it cuts nothing.
+/// pastes against its rule it refuses whole, and says why beside its window: a tool tip below the
+/// field would cover the next one and take its click. It cuts nothing.
 class TextField : public QLineEdit {
     Q_OBJECT
 
 public:
-    /// The longest text that a field shows whole and takes: a line edit needs time for each
-    /// keystroke that grows with its text.
-    static constexpr std::size_t maximumBytes = 100'000;
-
     explicit TextField(QWidget *parent);
 
-    /// Of a text longer than maximumBytes only the beginning is shown, and it cannot be edited: the
-    /// field looks so, and says why when a key is pressed in it.
+    /// Of a text that is too long to be edited only the beginning is shown: the field looks so, and
+    /// says why when a key is pressed in it.
     void showBytes(std::string_view bytes);
     /// Whether the field was given a text that it does not show whole; then that text still holds.
     [[nodiscard]] bool showsPartOnly() const { return isReadOnly(); }
@@ -51,11 +50,11 @@ public:
     /// was not changed is that one again, however long.
     [[nodiscard]] KeptText keptText(KeptText before) const;
 
-    /// Whether the text is one that the rule refuses or cuts, which it can be when neither keys nor
+    /// Whether the text is one that the rule refuses, which it can be when neither keys nor
     /// clipboard put it there; says why then.
-    [[nodiscard]] bool holdsRefusedText();
-    /// Puts in what the user chose elsewhere; when the rule refuses it or would cut it, the field
-    /// stays as it is and says why.
+    [[nodiscard]] bool holdsRefusedText() const { return !takes(text()); }
+    /// Puts in what the user chose elsewhere; when the rule refuses it, the field stays as it is
+    /// and says why.
     void replaceText(const QString &text);
 
     void showTip(const QString &tip) const;
@@ -65,6 +64,8 @@ protected:
     void keyPressEvent(QKeyEvent *event) override;
 
 private:
+    [[nodiscard]] bool takes(QString text) const;
+
     class Validator;
     Validator *validator_;
 };
