@@ -11,6 +11,8 @@
 #include "fetch/pophosts.h"
 #include "lists/maillist.h"
 #include "lists/maillistfile.h"
+#include "platform/kconfigwidget.h"
+#include "platform/kcontroldialog.h"
 #include "platform/process.h"
 #include "server/maildebatch.h"
 #include "server/mailimap.h"
@@ -96,7 +98,7 @@ KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
 void KTarvexApplication::showNote() {
     constexpr std::size_t namesInLine = 3;
     constexpr std::size_t namesInTip = 20;
-    setNote(applyNote(namesInLine), applyNote(namesInTip));
+    dialog()->setNote(applyNote(namesInLine), applyNote(namesInTip));
 }
 
 void KTarvexApplication::applyChanges() {

@@ -2,8 +2,9 @@
 
 #include <algorithm>
 #include <array>
-#include <cctype>
+#include <cstdio>
 #include <cstdlib>
+#include <strings.h>
 
 namespace {
 
@@ -47,12 +48,6 @@ std::int32_t parseTime(std::string_view text) {
     return (parseInteger(text) & byteMask) * 256 + (minute & byteMask);
 }
 
-std::string paddedToTwo(std::int32_t number) {
-    std::string text{number < 10 ? " " : ""};
-    text += std::to_string(number);
-    return text;
-}
-
 } // namespace
 
 std::optional<std::string> textSetting(std::optional<std::string> &field, TextOrNone text) {
@@ -83,7 +78,10 @@ std::optional<std::string> boolSetting(std::int32_t &field, TextOrNone text) {
 
 std::optional<std::string> timeSetting(std::int32_t &field, TextOrNone text) {
     if (!text) {
-        return paddedToTwo((field >> 8) & byteMask) + ':' + paddedToTwo(field & byteMask);
+        std::array<char, sizeof "255:255"> hourAndMinute{};
+        std::snprintf(hourAndMinute.data(), hourAndMinute.size(), "%2d:%2d",
+                      (field >> 8) & byteMask, field & byteMask);
+        return hourAndMinute.data();
     }
     field = parseTime(*text);
     return std::nullopt;
@@ -102,18 +100,7 @@ int compareNoCase(const char *a, const char *b) {
     if (a == nullptr || b == nullptr) {
         return -1;
     }
-    for (;; ++a, ++b) {
-        if (*a != *b) { // The library is asked where it matters only: keys mostly are as here.
-            const int lowerA = std::tolower(static_cast<unsigned char>(*a));
-            const int lowerB = std::tolower(static_cast<unsigned char>(*b));
-            if (lowerA != lowerB) {
-                return lowerA < lowerB ? -1 : 1;
-            }
-        }
-        if (*a == '\0') {
-            return 0;
-        }
-    }
+    return std::clamp(::strcasecmp(a, b), -1, 1);
 }
 
 std::string formatUnsigned(std::uint32_t value) { return std::to_string(value); }

@@ -52,14 +52,8 @@ bool KControlApplication::isPageRequested(const char *name) const {
     return requestedPages_.isEmpty() || requestedPages_.contains(QLatin1String{name});
 }
 
-QWidget *KControlApplication::dialog() const { return dialog_.get(); }
-
 void KControlApplication::addPage(KConfigWidget *page, const char *label, const char *helpFile) {
     dialog_->addPage(page, QString::fromUtf8(label), QString::fromUtf8(helpFile));
-}
-
-void KControlApplication::setNote(const QString &text, const QString &tip) {
-    dialog_->setNote(text, tip);
 }
 
 void KControlApplication::showDialog() {

@@ -5,7 +5,6 @@
 
 class KConfigWidget;
 class KControlDialog;
-class QWidget;
 
 /// The application base of a control module: the command line, the tabbed dialog with its buttons,
 /// help and the event loop. The command line is answered before a display is looked for; its
@@ -32,12 +31,9 @@ public:
 protected:
     [[nodiscard]] bool isPageRequested(const char *name) const;
     /// The parent of every page; null in init-only mode.
-    [[nodiscard]] QWidget *dialog() const;
+    [[nodiscard]] KControlDialog *dialog() const { return dialog_.get(); }
     /// Adds the page behind the others. `helpFile` is the name of a file in the help folder.
     void addPage(KConfigWidget *page, const char *label, const char *helpFile);
-
-    /// A line that the dialog shows above its buttons, and what its tool tip says.
-    void setNote(const QString &text, const QString &tip);
 
     void showDialog();
 

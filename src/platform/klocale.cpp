@@ -4,10 +4,9 @@
 
 #include <libintl.h>
 
-QString KLocale::translate(const char *text) const {
-    // An empty text would give the catalogue's header.
-    return domain_.empty() || *text == '\0' ? QString::fromUtf8(text)
-                                            : QString::fromUtf8(dgettext(domain_.c_str(), text));
+QString KLocale::translate(TranslatableText text) const {
+    return QString::fromUtf8(domain_.empty() ? text.literal()
+                                             : dgettext(domain_.c_str(), text.literal()));
 }
 
 void KLocale::open(const QString &name, const QString &directory) {

@@ -10,10 +10,7 @@
 class KLocale {
 public:
     /// The text in the user's language, or the text itself where no translation is installed.
-    [[nodiscard]] QString translate(const char *text) const;
-    [[nodiscard]] QString translate(TranslatableText text) const {
-        return translate(text.literal());
-    }
+    [[nodiscard]] QString translate(TranslatableText text) const;
 
     /// Finds the messages of the text domain `name` in `directory`.
     void open(const QString &name, const QString &directory);
