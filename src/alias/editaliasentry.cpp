@@ -9,6 +9,7 @@
 #include <QLabel>
 #include <QPushButton>
 
+#include <algorithm>
 #include <array>
 #include <optional>
 
@@ -27,12 +28,8 @@ constexpr std::array<TypeEntry, 5> typeEntries{{{"Address", ALIAS_ADDRESS},
 
 /// "Address" stands for every type that has no entry of its own.
 int entryShownFor(std::uint8_t type) {
-    for (std::size_t index = 0; index < typeEntries.size(); ++index) {
-        if (typeEntries.at(index).type == type) {
-            return static_cast<int>(index);
-        }
-    }
-    return 0;
+    const auto *found = std::ranges::find(typeEntries, type, &TypeEntry::type);
+    return found == typeEntries.end() ? 0 : static_cast<int>(found - typeEntries.begin());
 }
 
 } // namespace

@@ -96,8 +96,8 @@ KTarvexApplication::KTarvexApplication(int &argc, char **argv, const char *name)
 }
 
 void KTarvexApplication::showNote() {
-    constexpr std::size_t namesInLine = 3;
-    constexpr std::size_t namesInTip = 20;
+    constexpr int namesInLine = 3;
+    constexpr int namesInTip = 20;
     dialog()->setNote(applyNote(namesInLine), applyNote(namesInTip));
 }
 

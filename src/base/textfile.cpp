@@ -163,11 +163,9 @@ bool rewriteFile(const std::string &path, std::string_view bytes, mode_t newFile
 }
 
 int rewritingError(const std::string &path) {
-    const auto error = [](const std::string &name, int rights) {
-        return ::faccessat(AT_FDCWD, name.c_str(), rights, AT_EACCESS) == 0 ? 0 : errno;
-    };
-    const int ofFile = error(path, W_OK);
-    return ofFile == ENOENT ? error(folderOf(path), W_OK | X_OK) : ofFile;
+    const auto error = [](int result) { return result == 0 ? 0 : errno; };
+    const int ofFile = error(::access(path.c_str(), W_OK));
+    return ofFile == ENOENT ? error(::access(folderOf(path).c_str(), W_OK | X_OK)) : ofFile;
 }
 
 std::shared_ptr<void> lockFolderOf(const std::string &path) {

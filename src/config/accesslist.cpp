@@ -13,16 +13,12 @@ constexpr std::size_t longestWord = 17;
 constexpr std::size_t fullText = 255;
 
 struct PrefixMask {
-    char digit; ///< What stands behind the "/": its first character alone decides.
-    const char *suffix;
-    std::uint32_t mask; ///< In host byte order.
+    std::string_view suffix; ///< Its first digit alone decides.
+    std::uint32_t mask;      ///< In host byte order.
 };
 
-constexpr std::array<PrefixMask, 5> prefixMasks{{{'0', "/0", 0},
-                                                 {'8', "/8", 0xff000000},
-                                                 {'1', "/16", 0xffff0000},
-                                                 {'2', "/24", 0xffffff00},
-                                                 {'3', "/32", 0xffffffff}}};
+constexpr std::array<PrefixMask, 5> prefixMasks{
+    {{"/0", 0}, {"/8", 0xff000000}, {"/16", 0xffff0000}, {"/24", 0xffffff00}, {"/32", 0xffffffff}}};
 
 constexpr AccessListEntry allHosts{.address = 0, .mask = 0};
 constexpr AccessListEntry noHosts{.address = 0, .mask = 0xffffffff};
@@ -45,11 +41,10 @@ std::string_view withoutBlanks(std::string_view text) {
 /// Takes the mask that follows an address; `rest` begins with the character that ended the address.
 std::uint32_t takeMask(std::string_view &rest) {
     if (rest.starts_with('/') && rest.size() > 1) {
-        for (const PrefixMask &prefix : prefixMasks) {
-            if (prefix.digit == rest[1]) {
-                const std::string_view suffix = prefix.suffix;
+        for (const auto &[suffix, mask] : prefixMasks) {
+            if (suffix[1] == rest[1]) {
                 rest.remove_prefix(rest.starts_with(suffix) ? suffix.size() : 0);
-                return htonl(prefix.mask);
+                return htonl(mask);
             }
         }
     }
@@ -90,9 +85,9 @@ std::string formatEntry(const AccessListEntry &entry) {
     if (entry == noHosts) {
         return "none";
     }
-    for (const PrefixMask &prefix : prefixMasks) {
-        if (htonl(prefix.mask) == entry.mask) {
-            return textOf(entry.address) + prefix.suffix;
+    for (const auto &[suffix, mask] : prefixMasks) {
+        if (htonl(mask) == entry.mask) {
+            return textOf(entry.address).append(suffix);
         }
     }
     return textOf(entry.address) + ' ' + textOf(entry.mask);

@@ -2,14 +2,11 @@
 
 #include "base/byteset.h"
 #include "base/lines.h"
-#include "base/textfile.h"
 #include "config/productpaths.h"
 #include "config/settings.h"
 
-#include <algorithm>
 #include <cstdio>
 #include <map>
-#include <new>
 
 LostSettings lostSettings;
 
@@ -25,55 +22,41 @@ constexpr char commentMark = '|';
 constexpr char keyMark = '%';
 constexpr ByteSet blanks{" \t"};
 
+struct KeyLine {
+    std::string_view key;
+    std::optional<std::string_view> value; ///< None without a colon.
+};
+
+/// Divides a line that begins with the key mark.
+KeyLine divided(std::string_view line) {
+    const std::string_view text = lineText(line);
+    const std::size_t colon = text.find(':');
+    if (colon == std::string_view::npos) {
+        return {text.substr(1), std::nullopt};
+    }
+    return {text.substr(1, colon - 1), text.substr(colon + 1)};
+}
+
+using TemplateLines = std::map<std::string, std::optional<std::string_view>, LettersAlike>;
+
+/// Values by their keys: views of the template's bytes.
+TemplateLines templateLines(std::string_view masterTemplate) {
+    TemplateLines values;
+    LinePieces lines{masterTemplate};
+    while (const std::optional<std::string_view> line = lines.next()) {
+        if (line->front() == keyMark) {
+            const auto [key, value] = divided(*line);
+            values.insert_or_assign(std::string{key}, value);
+        }
+    }
+    return values;
+}
+
 /// How a value is spelled says nothing, nor how it is divided into lines.
 std::string withoutBlanksAndCommas(std::string_view value) {
     std::string rest{value};
     std::erase_if(rest, [](char byte) { return byte == ',' || blanks.holds(byte); });
     return rest;
-}
-
-struct KeyLine {
-    std::string_view key;
-    std::string_view value;
-    bool hasColon;
-};
-
-/// Divides the text of a line that begins with the key mark.
-KeyLine divided(std::string_view text) {
-    const std::size_t colon = std::min(text.find(':'), text.size());
-    const bool hasColon = colon < text.size();
-    return {text.substr(1, colon - 1), text.substr(hasColon ? colon + 1 : colon), hasColon};
-}
-
-struct LettersAlike {
-    bool operator()(const std::string &a, const std::string &b) const {
-        return compareNoCase(a.c_str(), b.c_str()) < 0;
-    }
-};
-
-/// By their keys; views of the template's bytes.
-using TemplateLines = std::map<std::string, KeyLine, LettersAlike>;
-
-TemplateLines templateLines(std::string_view masterTemplate) {
-    TemplateLines found;
-    LinePieces lines{masterTemplate};
-    while (const std::optional<std::string_view> line = lines.next()) {
-        if (line->front() == keyMark) {
-            const KeyLine keyLine = divided(lineText(*line));
-            found.insert_or_assign(std::string{keyLine.key}, keyLine);
-        }
-    }
-    return found;
-}
-
-/// Names the key among the lost ones, or takes it from there: its last line counts.
-void note(std::vector<std::string> &keys, const std::string &key, bool isLost) {
-    std::erase_if(keys, [&key](const std::string &other) {
-        return compareNoCase(other.c_str(), key.c_str()) == 0;
-    });
-    if (isLost && keys.size() < LostSettings::maximumNamed) {
-        keys.push_back(key);
-    }
 }
 
 /// Collects one setting's lines; hands them over when the next setting begins.
@@ -84,21 +67,20 @@ public:
 
     void begin(std::string_view key) {
         end();
-        isCut_ = false;
         key_ = key;
         value_.clear();
+        isCut_ = false;
     }
 
-    void add(std::string_view text) {
+    /// `rest` is what stands behind the line's text.
+    void add(std::string_view text, std::string_view rest) {
         text.remove_prefix(blanks.span(text));
         if (!text.empty() && !value_.empty()) {
             value_ += ',';
         }
         value_ += text;
+        isCut_ = isCut_ || holdsWord(rest);
     }
-
-    /// Of a line of the setting, what stands behind its text.
-    void drop(std::string_view rest) { isCut_ = isCut_ || (rest != "\n" && holdsWord(rest)); }
 
     void end() const {
         if (key_.empty()) {
@@ -108,34 +90,34 @@ public:
         if (setting != nullptr) {
             setting->exchange(value_);
         }
-        // The template's line gets the store's value, or stays as it is.
-        const auto line = template_.find(key_);
-        const bool isKept = line != template_.end() &&
-                            (setting != nullptr ? line->second.hasColon
-                                                : withoutBlanksAndCommas(line->second.value) ==
-                                                      withoutBlanksAndCommas(value_));
-        note(lostSettings.keys, key_, !isKept || isCut_);
-        note(lostSettings.accessLists, key_,
-             isKept && dynamic_cast<AccessListSetting *>(setting) != nullptr &&
-                 !isKeptWhole(value_));
+        if (!isKept(setting) || isCut_) {
+            lostSettings.keys.insert(key_);
+        } else if (dynamic_cast<AccessListSetting *>(setting) != nullptr && !isKeptWhole(value_)) {
+            lostSettings.accessLists.insert(key_);
+        }
     }
 
 private:
+    /// The template's line gets the store's value, or stays as it is.
+    bool isKept(const Setting *setting) const {
+        const auto line = template_.find(key_);
+        if (line == template_.end() || setting != nullptr) {
+            return line != template_.end() && line->second;
+        }
+        return withoutBlanksAndCommas(line->second.value_or("")) == withoutBlanksAndCommas(value_);
+    }
+
     TemplateLines template_;
-    bool isCut_ = false;
     std::string key_;
     std::string value_;
+    bool isCut_ = false;
 };
 
 std::optional<std::string> readTemplate() {
-    hasTemplate = false;
-    try {
-        FileRead file = readWholeFile(productPaths().masterTemplate);
-        hasTemplate = file.bytes.has_value();
-        return std::move(file.bytes);
-    } catch (const std::bad_alloc &) {
-        return std::nullopt;
-    }
+    std::optional<std::string> lines;
+    const auto take = [&lines](std::string bytes) { lines = std::move(bytes); };
+    hasTemplate = ProductFile{}.read(productPaths().masterTemplate, take) == 0;
+    return lines;
 }
 
 void appendValue(std::string &bytes, std::string_view value) {
@@ -151,15 +133,15 @@ void appendValue(std::string &bytes, std::string_view value) {
 
 /// Appends a template's key line with the store's value, or as it is.
 void appendKeyLine(std::string &bytes, std::string_view line) {
-    const std::size_t colon = beforeNul(line).find(':');
-    if (colon != std::string_view::npos) {
-        if (const auto value = settingByKey(std::string{line.substr(1, colon - 1)}, std::nullopt)) {
-            bytes += line.substr(0, colon);
-            appendValue(bytes, *value);
-            return;
-        }
+    const auto [key, ownValue] = divided(line);
+    const std::optional<std::string> value = settingByKey(std::string{key}, std::nullopt);
+    if (!ownValue || !value) {
+        bytes += line;
+        return;
     }
-    bytes += line;
+    bytes += keyMark;
+    bytes += key;
+    appendValue(bytes, *value);
 }
 
 } // namespace
@@ -169,19 +151,18 @@ void parseMasterConfig(std::string_view bytes, std::string_view masterTemplate) 
     lostSettings = {};
     LinePieces lines{bytes};
     while (const std::optional<std::string_view> line = lines.next()) {
-        std::string_view text = lineText(*line);
-        const std::string_view rest = line->substr(text.size());
         const bool isEmptyLine = line->front() == '\r' || line->front() == '\n';
         if (isEmptyLine || line->front() == commentMark) {
             continue;
         }
+        std::string_view text = lineText(*line);
+        const std::string_view rest = line->substr(text.size());
         if (line->front() == keyMark) {
-            const KeyLine keyLine = divided(text);
-            setting.begin(keyLine.key);
-            text = keyLine.value;
+            const auto [key, value] = divided(*line);
+            setting.begin(key);
+            text = value.value_or("");
         }
-        setting.add(text);
-        setting.drop(rest);
+        setting.add(text, rest);
     }
     setting.end();
 }

@@ -1,10 +1,11 @@
 #pragma once
 
 #include "base/productfile.h"
+#include "config/settingvalues.h"
 
+#include <set>
 #include <string>
 #include <string_view>
-#include <vector>
 
 /// The master file and its template share one line format. The first character decides:
 ///
@@ -16,12 +17,17 @@
 /// with "%" or "|") up to the next key line, joined with ","; comments and empty lines between them
 /// do not end it. On writing, the template gives keys, order and comments, the store the values.
 
-/// What the next rewriting takes away although nobody edited it: the keys as the file spells them,
-/// the first of them.
+struct LettersAlike {
+    bool operator()(const std::string &a, const std::string &b) const {
+        return compareNoCase(a.c_str(), b.c_str()) < 0;
+    }
+};
+using KeyNames = std::set<std::string, LettersAlike>;
+
+/// What the next rewriting takes away although nobody edited it.
 struct LostSettings {
-    static constexpr std::size_t maximumNamed = 21;
-    std::vector<std::string> keys; ///< The template names them not, or gives them another value.
-    std::vector<std::string> accessLists; ///< These lose items, or have some widened or narrowed.
+    KeyNames keys;            ///< The template names them not, or gives them another value.
+    KeyNames accessLists;     ///< These lose items, or have some widened or narrowed.
     std::size_t fetchers = 0; ///< Entries that cannot be read. Who parses them counts them.
 };
 
