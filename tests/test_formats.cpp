@@ -152,11 +152,8 @@ private slots:
         checkRows(filled, "[writing the master file]");
     }
 
-    void noiseAndALineOf100MegabytesHideNothing() {
-        std::mt19937 random{1};
-        std::string bytes(200'000, '\0');
-        std::ranges::generate(bytes, [&] { return static_cast<char>(random()); });
-        bytes += "\n%admin.email:";
+    void aLineOf100MegabytesHidesNothing() {
+        std::string bytes = "%admin.email:";
         bytes.resize(bytes.size() + 100'000'000, ',');
         parseMasterConfig(bytes + "\n%smtp.sock.port: 2525\n");
         QCOMPARE(settings().admin_email.value.value_or("").size(), 100'000'000U);

@@ -2,7 +2,6 @@
 
 #include "datafiles.h"
 
-#include "base/lines.h"
 #include "platform/process.h"
 
 #include <QDir>
@@ -36,16 +35,6 @@ struct Fault {
 } present;
 
 std::string done; ///< "w" for each write, "s" for each time that a file is put on the disk.
-
-/// The pieces, each with a semicolon behind it.
-std::string cut(std::string_view bytes, std::size_t longest) {
-    std::string text;
-    LinePieces pieces{bytes, longest};
-    while (const auto piece = pieces.next()) {
-        text += std::string{*piece} + ';';
-    }
-    return text;
-}
 
 } // namespace
 
@@ -231,12 +220,6 @@ private slots:
             QVERIFY2(product.read(path, take) == 1, path.c_str());
             QVERIFY2(!product.rewrite(format) && product.obstacle(), path.c_str());
         }
-    }
-
-    void linesAreCutAtTheirEndAndAtTheLimit() {
-        checkRows([](const std::string &bytes) { return cut(bytes, 4); }, "[pieces of 4]");
-        QCOMPARE(cut("abcdefg\nh\n", LinePieces<std::string_view>::unlimited),
-                 std::string{"abcdefg\n;h\n;"});
     }
 };
 

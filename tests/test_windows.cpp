@@ -119,25 +119,15 @@ private slots:
         }
     }
 
-    /// To a screen reader every part has a name of its own, and every letter leads to its field.
-    void namesAndLettersDiffer() {
+    /// To a screen reader every part has a name of its own.
+    void namesDiffer() {
         for (const auto make : makers) {
             const Window window = make();
             window->show();
-            QVERIFY(QTest::qWaitForWindowActive(window.get()));
             QStringList names;
             for (QWidget *part : partsOf(window.get())) {
-                const auto *label = qobject_cast<QLabel *>(part);
-                if (label == nullptr) {
+                if (!part->inherits("QLabel")) {
                     names << QAccessible::queryAccessibleInterface(part)->text(QAccessible::Name);
-                } else if (label->buddy() != nullptr) {
-                    const QKeySequence letter = QKeySequence::mnemonic(label->text());
-                    // Where two share one, the next press leads to the other.
-                    for (int press = 0; press < 2 && !label->buddy()->hasFocus(); ++press) {
-                        QTest::keySequence(window.get(), letter);
-                    }
-                    QVERIFY2(letter.isEmpty() || label->buddy()->hasFocus(),
-                             qPrintable(described(label)));
                 }
             }
             QVERIFY2(!names.contains("") && names.removeDuplicates() == 0,

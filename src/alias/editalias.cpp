@@ -8,10 +8,6 @@ namespace {
 
 KeptText shown(const alias_list_entry &target) { return target.alias; }
 
-alias_list_entry copyOf(const alias_list_entry &target) {
-    return {.alias = target.alias, .type = target.type, .bang = target.bang};
-}
-
 } // namespace
 
 EditAlias::EditAlias(QWidget *parent, const char *name, const alias_entry *alias)
@@ -26,7 +22,7 @@ EditAlias::EditAlias(QWidget *parent, const char *name, const alias_entry *alias
     group_->column()->addStretch(100);
     rows()->addWidget(group_);
     if (alias != nullptr) {
-        targets_ = alias->aliases.copied(copyOf);
+        targets_ = alias->aliases.copied();
         targetRows_.fill();
     }
     addButtons(5, 15);

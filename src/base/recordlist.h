@@ -122,13 +122,11 @@ struct RecordChain {
         }
     }
 
-    /// The records in the same order, each the result of `copyOf(record)`.
-    template <class CopyOf>
-    [[nodiscard]] RecordChain copied(CopyOf copyOf) const {
+    [[nodiscard]] RecordChain copied() const {
         RecordChain copies;
         RecordAppender<Record> end{&copies.head};
         for (const Record &record : *this) {
-            end.append(copyOf(record));
+            end.append(record);
         }
         return copies;
     }

@@ -8,13 +8,11 @@ constexpr int buttonWidth = 60;
 constexpr int buttonHeight = 22;
 constexpr QSize minimumBox{120, 40};
 
-maillist_addr_entry copyOf(const maillist_addr_entry &entry) { return {entry.addr}; }
-
 } // namespace
 
 AddressGroup::AddressGroup(const Kind &kind, EditList *editor, const maillist_entry &list)
     : ListGroup(kind.caption, {.box = 1000, .column = 0}, editor),
-      chain_{(list.*kind.chain).copied(copyOf)} {
+      chain_{(list.*kind.chain).copied()} {
     box()->setMinimumSize(minimumBox);
     // The box takes what height there is; only the buttons beside it ask for some.
     box()->setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Ignored);

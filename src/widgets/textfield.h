@@ -15,10 +15,9 @@ struct FieldRule {
     /// Beyond this a line edit takes too long for a keystroke.
     static constexpr std::size_t longestEditable = 100'000;
 
-
-    QString refused{};            ///< Characters that the text must not hold.
-    QString refusedFirst{};       ///< Characters that it must not begin with.
-    QString toolTip{};            ///< Says so; it appears at the field when they are typed.
+    QString refused{};      ///< Characters that the text must not hold.
+    QString refusedFirst{}; ///< Characters that it must not begin with.
+    QString toolTip{};      ///< Says so; it appears at the field when they are typed.
     std::size_t maximumBytes = longestEditable; ///< Or as many as the text had that was shown.
 };
 

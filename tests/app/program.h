@@ -12,7 +12,6 @@
 #include <poll.h>
 #include <string>
 #include <sys/prctl.h>
-#include <sys/resource.h>
 #include <sys/socket.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -78,10 +77,6 @@ struct Program : QProcess {
     int end() {
         const bool isEnded = waitForFinished(60'000);
         return isEnded ? exitCode() * (exitStatus() == CrashExit ? -1 : 1) : hangs;
-    }
-    void limitFileSize(rlim_t longest) const {
-        const rlimit limit{.rlim_cur = longest, .rlim_max = RLIM_INFINITY};
-        prlimit(number, RLIMIT_FSIZE, &limit, nullptr);
     }
     int line;
     pid_t number;

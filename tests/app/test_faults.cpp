@@ -318,27 +318,6 @@ private slots:
         QVERIFY(program.isReady() && program.applies());
     }
 
-    void aLimitOfFileSizeLeavesFilesWhole() {
-        makeProduct(20'000);
-        lay();
-        const Program running;
-        QVERIFY(running.isReady());
-        for (const rlim_t longest : {4, 140'000, 180'000}) {
-            lay();
-            running.limitFileSize(longest);
-            QVERIFY(running.applies());
-            const std::string left = state();
-            for (std::size_t at = 0; at < masterTemplate; ++at) {
-                const bool hasSpace = bytesAt("new/" + names[at]).size() <= longest;
-                QVERIFY2(left[at] == "01"[hasSpace], left.c_str());
-            }
-            running.limitFileSize(RLIM_INFINITY);
-            lay();
-            QVERIFY(running.applies());
-            QCOMPARE(state(), "1111ran");
-        }
-    }
-
     /// Reading and writing alone: the toolkit does not survive without memory.
     void aLimitOfMemoryLeavesFilesWhole() {
         if (withSanitizer) {
