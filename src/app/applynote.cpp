@@ -32,7 +32,7 @@ struct FileTexts {
     TranslatableText lost;
 };
 
-const std::array<FileTexts, 3> fileTexts{
+constexpr std::array<FileTexts, 3> fileTexts{
     {{aliasFile, translatable("Aliases will not be saved: %1."),
       translatable("lines of the alias file (%1)")},
      {rejectFile, translatable("Blocked domains will not be saved: %1."),
@@ -45,18 +45,17 @@ const std::array<FileTexts, 3> fileTexts{
 QString applyNote(qsizetype maximumNames) {
     QStringList sentences;
     QStringList dropped;
-    const auto isSaved = [&](std::optional<TranslatableText> obstacle, TranslatableText unsaved) {
-        if (obstacle) {
-            sentences << translated(unsaved).arg(translated(*obstacle));
-        }
-        return !obstacle;
-    };
     const auto addCount = [&](std::size_t count, TranslatableText what) {
         if (count > 0) {
             dropped << translated(what).arg(count);
         }
     };
-    if (isSaved(masterFileObstacle(), translatable("Settings will not be saved: %1."))) {
+    const auto addUnsaved = [&](TranslatableText unsaved, TranslatableText obstacle) {
+        sentences << translated(unsaved).arg(translated(obstacle));
+    };
+    if (const auto obstacle = masterFileObstacle()) {
+        addUnsaved(translatable("Settings will not be saved: %1."), *obstacle);
+    } else {
         const auto &[keys, accessLists, fetchers] = lostSettings;
         if (!keys.empty()) {
             dropped << translated(translatable("settings that cannot be kept (%1)"))
@@ -66,7 +65,9 @@ QString applyNote(qsizetype maximumNames) {
         addCount(fetchers, translatable("fetchers that cannot be read (%1)"));
     }
     for (const auto &[file, unsaved, lost] : fileTexts) {
-        if (isSaved(file.obstacle(), unsaved)) {
+        if (const auto obstacle = file.obstacle()) {
+            addUnsaved(unsaved, *obstacle);
+        } else {
             addCount(file.lostLines, lost);
         }
     }

@@ -11,13 +11,29 @@
 
 namespace {
 
-std::atomic<unsigned> arrived{0}; ///< A bit for each signal that waits.
+constexpr const char *busVariable = "DBUS_SESSION_BUS_ADDRESS";
+bool isBusHidden = false;
 
+struct SignalHandler {
+    int signal;
+    void (*other)(int); ///< That which is not in use.
+};
+
+// Where they are ignored, the write fails like any other.
+std::array<SignalHandler, 2> writeSignals{{{SIGPIPE, SIG_IGN}, {SIGXFSZ, SIG_IGN}}};
+
+void hold(int signal);
+
+// Caught rather than blocked: a blocked signal would still reach one of the toolkit's threads and
+// end the process there.
+std::array<SignalHandler, 3> endSignals{{{SIGTERM, hold}, {SIGINT, hold}, {SIGHUP, hold}}};
+
+std::atomic<unsigned> arrived{0}; ///< A bit for each signal that waits.
 std::atomic<bool> areHeld{false};
 
 void raiseArrived() {
     const unsigned waiting = arrived.exchange(0);
-    for (const int signal : {SIGTERM, SIGINT, SIGHUP}) {
+    for (const auto &[signal, other] : endSignals) {
         if ((waiting & 1U << signal) != 0) {
             [[maybe_unused]] const int result = std::raise(signal);
         }
@@ -31,21 +47,6 @@ void hold(int signal) {
         raiseArrived();
     }
 }
-
-constexpr const char *busVariable = "DBUS_SESSION_BUS_ADDRESS";
-bool isBusHidden = false;
-
-struct SignalHandler {
-    int signal;
-    void (*other)(int); ///< That which is not in use.
-};
-
-// Where they are ignored, the write fails like any other.
-std::array<SignalHandler, 2> writeSignals{{{SIGPIPE, SIG_IGN}, {SIGXFSZ, SIG_IGN}}};
-
-// Caught rather than blocked: a blocked signal would still reach one of the toolkit's threads and
-// end the process there.
-std::array<SignalHandler, 3> endSignals{{{SIGTERM, hold}, {SIGINT, hold}, {SIGHUP, hold}}};
 
 template <std::size_t count>
 void exchange(std::array<SignalHandler, count> &handlers) {
