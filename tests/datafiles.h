@@ -47,13 +47,6 @@ std::string whole(auto format, const List &list) {
     return bytes;
 }
 
-/// A path in the test's own product at which no file is yet.
-inline std::string newPath() {
-    std::filesystem::remove_all(TEST_PRODUCT);
-    std::filesystem::create_directories(TEST_PRODUCT);
-    return TEST_PRODUCT "/file";
-}
-
 /// The bytes of a file among the application's test data, with the product's path in it.
 inline std::string given(const std::filesystem::path &name) {
     QByteArray bytes = QByteArray::fromStdString(bytesAt(TEST_DATA "/app" / name));

@@ -318,6 +318,21 @@ private slots:
         QVERIFY(program.isReady() && program.applies());
     }
 
+    void aLimitOfFileSizeLeavesFilesWhole() {
+        makeProduct(20'000);
+        for (const rlim_t longest : {4, 140'000, 180'000}) {
+            lay();
+            const rlimit limit{.rlim_cur = longest, .rlim_max = longest};
+            const Program program{{}, [&] { setrlimit(RLIMIT_FSIZE, &limit); }};
+            QVERIFY(program.isReady() && program.applies());
+            const std::string left = state();
+            for (std::size_t at = 0; at < masterTemplate; ++at) {
+                const bool hasSpace = bytesAt("new/" + names[at]).size() <= longest;
+                QVERIFY2(left[at] == "01"[hasSpace], left.c_str());
+            }
+        }
+    }
+
     /// Reading and writing alone: the toolkit does not survive without memory.
     void aLimitOfMemoryLeavesFilesWhole() {
         if (withSanitizer) {
