@@ -14,6 +14,9 @@ class MailAlias : public KConfigWidget {
 public:
     MailAlias(QWidget *parent, const char *name);
 
+    void loadValues() override {}
+    void storeValues() override {}
+
 public slots:
     void MailAliasAdd();
     void MailAliasRemove();

@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <cctype>
 #include <cstddef>
-#include <cstring>
 #include <optional>
 #include <string_view>
 
@@ -28,14 +27,9 @@ public:
         }
         // The search stays within the piece: short pieces of one endless line are cut in linear
         // time.
-        const std::size_t reach = rest_.size() < longest_ ? rest_.size() : longest_;
-        const void *lineFeed = std::memchr(rest_.data(), '\n', reach);
-        const std::size_t length =
-            lineFeed == nullptr
-                ? reach
-                : static_cast<std::size_t>(static_cast<const char *>(lineFeed) - rest_.data()) + 1;
-        const Text piece = rest_.substr(0, length);
-        rest_.remove_prefix(length);
+        const std::string_view reach = std::string_view{rest_}.substr(0, longest_);
+        const Text piece = rest_.substr(0, std::min(reach.find('\n'), reach.size() - 1) + 1);
+        rest_.remove_prefix(piece.size());
         return piece;
     }
 

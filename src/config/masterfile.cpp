@@ -90,6 +90,8 @@ public:
         if (setting != nullptr) {
             setting->exchange(value_);
         }
+        lostSettings.keys.erase(key_); // Of several lines the last counts.
+        lostSettings.accessLists.erase(key_);
         if (!isKept(setting) || isCut_) {
             lostSettings.keys.insert(key_);
         } else if (dynamic_cast<AccessListSetting *>(setting) != nullptr && !isKeptWhole(value_)) {

@@ -26,7 +26,7 @@ using KeyNames = std::set<std::string, LettersAlike>;
 
 /// What the next rewriting takes away although nobody edited it.
 struct LostSettings {
-    KeyNames keys;            ///< The template names them not, or gives them another value.
+    KeyNames keys;            ///< The template has them not, or other values; or theirs are cut.
     KeyNames accessLists;     ///< These lose items, or have some widened or narrowed.
     std::size_t fetchers = 0; ///< Entries that cannot be read. Who parses them counts them.
 };

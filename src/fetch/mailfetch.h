@@ -16,6 +16,7 @@ class MailFetch : public KConfigWidget {
 public:
     MailFetch(QWidget *parent, const char *name);
 
+    void loadValues() override {}
     void storeValues() override;
 
 public slots:

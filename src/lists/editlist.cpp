@@ -130,9 +130,12 @@ EditList::EditList(QWidget *parent, const char *name, const maillist_entry *list
     rows()->addWidget(columns);
     addButtons(pageBorder, pageBorder, pageBorder);
     const QSize available = availableSize(this);
-    const QSize wanted = layout()->totalSizeHint(); // An area that scrolls asks for less.
+    // An area that scrolls asks for less.
+    const QSize wanted = layout()->totalSizeHint();
+    const int scrollBar = style()->pixelMetric(QStyle::PM_ScrollBarExtent);
+    const QSize narrowest{layout()->totalMinimumSize().width() + scrollBar, 0};
     rows()->addWidget(scrolling(columns));
-    setMinimumSize(minimumWindow.boundedTo(available));
+    setMinimumSize(minimumWindow.expandedTo(narrowest).boundedTo(available));
     resize(wanted.boundedTo(available));
 }
 

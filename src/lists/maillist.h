@@ -14,6 +14,9 @@ class MailList : public KConfigWidget {
 public:
     MailList(QWidget *parent, const char *name);
 
+    void loadValues() override {}
+    void storeValues() override {}
+
 public slots:
     void MailListAdd();
     void MailListRemove();

@@ -36,17 +36,11 @@ void KControlApplication::setTitle(const QString &title) {
     }
 }
 
-void KControlApplication::init() {}
-
-void KControlApplication::applyChanges() {}
-
 void KControlApplication::help() {
     if (dialog_) {
         dialog_->showHelp(shared(name() + "/help"));
     }
 }
-
-void KControlApplication::defaultValues() {}
 
 bool KControlApplication::isPageRequested(const char *name) const {
     return requestedPages_.isEmpty() || requestedPages_.contains(QLatin1String{name});

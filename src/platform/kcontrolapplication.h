@@ -22,11 +22,11 @@ public:
 
     void setTitle(const QString &title);
 
-    virtual void init();
+    virtual void init() {}
     /// What OK and Apply do; nothing here.
-    virtual void applyChanges();
+    virtual void applyChanges() {}
     virtual void help();
-    virtual void defaultValues();
+    virtual void defaultValues() {}
 
 protected:
     [[nodiscard]] bool isPageRequested(const char *name) const;

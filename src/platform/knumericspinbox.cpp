@@ -19,8 +19,6 @@ void KNumericSpinBox::setRange(int minimum, int maximum) {
     QSpinBox::setRange(minimum, maximum);
 }
 
-void KNumericSpinBox::setStep(int step) { setSingleStep(step); }
-
 void KNumericSpinBox::setValue(int value) {
     // The toolkit's box clamps what is set; so its range reaches out to the value while that
     // stands.
@@ -33,8 +31,6 @@ void KNumericSpinBox::setValue(int value) {
     // The field is made for the range; a number with more digits may not be seen whole in it.
     setToolTip(value < minimum_ || value > maximum_ ? text() : QString{});
 }
-
-int KNumericSpinBox::getValue() const { return value(); }
 
 void KNumericSpinBox::setEditable(bool editable) { lineEdit()->setReadOnly(!editable); }
 

@@ -13,9 +13,9 @@ public:
 
     /// To be called before setValue; both ends belong to the range.
     void setRange(int minimum, int maximum);
-    void setStep(int step);
+    void setStep(int step) { setSingleStep(step); }
     void setValue(int value);
-    [[nodiscard]] int getValue() const;
+    [[nodiscard]] int getValue() const { return value(); }
     /// Whether the number can be typed, rather than only stepped.
     void setEditable(bool editable);
 

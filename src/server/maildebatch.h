@@ -10,6 +10,7 @@ class MailDebatch : public KConfigWidget {
 public:
     MailDebatch(QWidget *parent, const char *name);
 
+    void loadValues() override {}
     void storeValues() override { form_.store(); }
 
 private:

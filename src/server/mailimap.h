@@ -10,6 +10,7 @@ class MailIMAP : public KConfigWidget {
 public:
     MailIMAP(QWidget *parent, const char *name);
 
+    void loadValues() override {}
     void storeValues() override { form_.store(); }
 
 private:

@@ -10,6 +10,7 @@ class MailPOP3 : public KConfigWidget {
 public:
     MailPOP3(QWidget *parent, const char *name);
 
+    void loadValues() override {}
     void storeValues() override { form_.store(); }
 
 private:

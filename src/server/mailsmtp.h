@@ -15,6 +15,7 @@ class MailSMTP : public KConfigWidget {
 public:
     MailSMTP(QWidget *parent, const char *name);
 
+    void loadValues() override {}
     void storeValues() override { form_.store(); }
 
 public slots:

@@ -69,7 +69,9 @@ const NoteRow noteRows[]{
      "Mailing lists will not be saved: the file appeared meanwhile."},
     {"printf '%%a: 1\\n%%B:\\n%%not.known:0 \\n%%mail.domains: a\\rb\\n' >>config/master",
      "An apply will drop: settings that cannot be kept (a, B, mail.domains)."},
-    {"printf '%%x: 1\\n\\t2\\n' >>config/master; echo '%X: 1, 2' >>config/templates/master", ""},
+    {"printf '%%x: 0\\n%%X: 1\\n\\t2\\n%%smtp.allow: x\\n%%SMTP.allow: all' >>config/master; "
+     "echo '%X: 1, 2' >>config/templates/master",
+     ""},
     {"printf '%%not.known: 2\\n%%c:\\n%%d:\\n%%e:\\n' >>config/master; "
      "sed -i '/smtp.time/s/:.*//' config/templates/master",
      "An apply will drop: settings that cannot be kept (c, d, e, ...).", ":", ""},
