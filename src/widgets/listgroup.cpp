@@ -1,6 +1,5 @@
 #include "widgets/listgroup.h"
 
-#include "widgets/captions.h"
 #include "widgets/minimumsize.h"
 
 ListGroup::ListGroup(const char *caption, Stretch stretch, QWidget *parent)
